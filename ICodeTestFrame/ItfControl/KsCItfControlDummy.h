@@ -1,0 +1,18 @@
+// The control object of a host that switched the test frame off: does nothing, answers true.
+#pragma once
+
+#include "ItfControl/KsCItfControlIF.h"
+#include "ItfControl/KsCItfMemory.h"
+
+class KsCItfControlDummy : public KsCItfControlIF, public KsCItfObject {
+public:
+    using KsCItfObject::operator new;
+    using KsCItfObject::operator delete;
+
+    bool init(KS_ICodeFactoryContainer*, KS_ExprDescrComponent*, KsCCodeViewData*,
+              KS_ExprDescrTupelServer*, KS_Options*) override {
+        return true;
+    }
+    bool exit() override { return true; }
+    bool run() override { return true; }
+};

@@ -1,0 +1,66 @@
+// Creates every object of the syntax tree and owns all of them until exit: nodes, source
+// positions and token texts. Objects live in arena blocks taken through the module's
+// allocation pair; exit destroys them in creation order and returns the blocks.
+#pragma once
+
+#include "ItfControl/KsCItfMemory.h"
+#include "ItfFactory/KsCItfString.h"
+#include "ItfFactory/KsCItfTextPool.h"
+#include "ItfHostInterface/KS_Dump.h"
+
+#include <cstddef>
+#include <new>
+#include <type_traits>
+#include <utility>
+#include <vector>
+
+class KsCItfSrcRef;
+
+class KsCItfFactory : public KsCItfObject {
+public:
+    KsCItfFactory() = default;
+    virtual ~KsCItfFactory();
+    KsCItfFactory(const KsCItfFactory&) = delete;
+    KsCItfFactory& operator=(const KsCItfFactory&) = delete;
+
+    virtual bool init();
+    virtual bool exit();
+
+    KsCItfSrcRef* createSrcRef();
+    KsCItfString* createString();
+
+    // The pooled copy of a text, alive until exit.
+    const char* intern(std::string_view text) { return pool_.intern(text); }
+
+    std::size_t objectCount() const { return dumpables_.size() + strings_.size(); }
+
+protected:
+    template <class T, class... Args> T* make(Args&&... args) {
+        // The slot is taken first, so that an object never exists without its owner entry.
+        auto& owners = ownersOf<T>();
+        owners.push_back(nullptr);
+        void* place = allocateInArena(sizeof(T), alignof(T));
+        T* object = new (place) T(std::forward<Args>(args)...);
+        owners.back() = object;
+        return object;
+    }
+
+private:
+    template <class T> auto& ownersOf() {
+        if constexpr (std::is_base_of_v<KS_Dumpable, T>)
+            return dumpables_;
+        else
+            return strings_;
+    }
+    void* allocateInArena(std::size_t size, std::size_t alignment);
+
+    struct Block {
+        Block* next;
+    };
+    Block* blocks_ = nullptr;
+    char* cursor_ = nullptr;
+    char* limit_ = nullptr;
+    std::vector<KS_Dumpable*, KsCItfAllocator<KS_Dumpable*>> dumpables_;
+    std::vector<KsCItfString*, KsCItfAllocator<KsCItfString*>> strings_;
+    KsCItfTextPool pool_;
+};
