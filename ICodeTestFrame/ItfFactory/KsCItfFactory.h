@@ -7,6 +7,7 @@
 #include "ItfFactory/KsCItfString.h"
 #include "ItfFactory/KsCItfTextPool.h"
 #include "ItfHostInterface/KS_Dump.h"
+#include "ItfSyntaxTree/KsCItfSyntaxTree.h"
 
 #include <cstddef>
 #include <new>
@@ -28,6 +29,19 @@ public:
 
     KsCItfSrcRef* createSrcRef();
     KsCItfString* createString();
+
+    // One creator per concrete node class: createApplication, createAdditiveExpression_AddOp...
+#define ITF_CREATE_PRODUCTION(NT, Production, Children)                                        \
+    KsCItf##NT##_##Production* create##NT##_##Production() {                                   \
+        return make<KsCItf##NT##_##Production>();                                              \
+    }
+#define ITF_CREATE_SINGLE(Name, Downcast, Children)                                            \
+    KsCItf##Name* create##Name() { return make<KsCItf##Name>(); }
+#define ITF_CREATE_ABSTRACT(Name, Downcast, Children) ITF_PRODUCTIONS_##Name(ITF_CREATE_PRODUCTION)
+    ITF_NONTERMINALS(ITF_CREATE_SINGLE, ITF_CREATE_ABSTRACT)
+#undef ITF_CREATE_PRODUCTION
+#undef ITF_CREATE_SINGLE
+#undef ITF_CREATE_ABSTRACT
 
     // The pooled copy of a text, alive until exit.
     const char* intern(std::string_view text) { return pool_.intern(text); }
