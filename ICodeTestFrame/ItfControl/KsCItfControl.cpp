@@ -2,8 +2,15 @@
 
 #include "ItfControl/KsCItfHostServices.h"
 #include "ItfFactory/KsCItfFactory.h"
+#include "ItfHostInterface/KS_Dump.h"
+#include "ItfHostInterface/KS_Options.h"
+#include "ItfInput/KsCItfInput.h"
 #include "ItfMessages/KsCItfMessages.h"
+#include "ItfParser/KsCItfParser.h"
+#include "ItfScanner/KsCItfScanner.h"
+#include "ItfSrcRef/KsCItfParseInfo.h"
 #include "ItfSrcRef/KsCItfSrcRefServer.h"
+#include "ItfTypeNameRegistry/KsCItfTypeNameRegistry.h"
 
 #include <new>
 
@@ -20,11 +27,46 @@ template <class Server> bool finish(Server*& server) {
     return true;
 }
 
+// The parser's stack depth for every test file.
+constexpr int kParserDepth = 150;
+
+// Designates a run's parse info for its whole duration and releases it on every way out.
+class ParseInfoScope {
+public:
+    ParseInfoScope(KsCItfFactory* factory, KsCItfMessages* messages,
+                   KsCItfTypeNameRegistry* registry)
+        : info_(new KsCItfParseInfo()) {
+        info_->setFactory(factory);
+        info_->setMessages(messages);
+        info_->setTypeNameRegistry(registry);
+        theParseInfo = info_;
+    }
+    ~ParseInfoScope() {
+        theParseInfo = nullptr;
+        delete info_;
+    }
+    KsCItfParseInfo* operator->() const { return info_; }
+
+private:
+    KsCItfParseInfo* info_;
+};
+
+// Owns the run's input files until the end of the run, whichever way it ends.
+struct InputFiles {
+    KsCItfInputFileList files;
+    ~InputFiles() {
+        for (KsCItfInputFile* file : files)
+            delete file;
+    }
+};
+
 } // namespace
 
 KsCItfControl::KsCItfControl() {
+    input_ = new KsCItfInput();
     factory_ = new KsCItfFactory();
     messages_ = new KsCItfMessages();
+    typeNameRegistry_ = new KsCItfTypeNameRegistry();
     srcRefServer_ = new KsCItfSrcRefServer();
 }
 
@@ -32,8 +74,10 @@ KsCItfControl::~KsCItfControl() {
     if (exit())
         return;
     // A server refused to finish: release the rest anyway so nothing outlives the object.
+    delete input_;
     delete factory_;
     delete messages_;
+    delete typeNameRegistry_;
     delete srcRefServer_;
 }
 
@@ -54,9 +98,13 @@ bool KsCItfControl::initServers(KS_ICodeFactoryContainer* container,
                                 KS_ExprDescrTupelServer* tupelServer) {
     const KsCItfHostServices host = KsCItfHostServices::fetch(container, exprDescr, codeViewData);
     (void)tupelServer;
+    if (input_ && !input_->init())
+        return false;
     if (factory_ && !factory_->init())
         return false;
     if (messages_ && !messages_->init(srcRefServer_, factory_))
+        return false;
+    if (typeNameRegistry_ && !typeNameRegistry_->init(host.dataTypeServer, messages_))
         return false;
     if (srcRefServer_ && !srcRefServer_->init(host.srcRefServer))
         return false;
@@ -64,7 +112,8 @@ bool KsCItfControl::initServers(KS_ICodeFactoryContainer* container,
 }
 
 bool KsCItfControl::exit() {
-    return finish(factory_) && finish(messages_) && finish(srcRefServer_);
+    return finish(input_) && finish(factory_) && finish(messages_) &&
+           finish(typeNameRegistry_) && finish(srcRefServer_);
 }
 
 bool KsCItfControl::run() {
@@ -76,4 +125,49 @@ bool KsCItfControl::run() {
     }
 }
 
-bool KsCItfControl::runTests() { return true; }
+bool KsCItfControl::runTests() {
+    if (!input_ || !factory_ || !messages_ || !typeNameRegistry_) {
+        reportInternalError("KsCItfControl", 103);
+        return false;
+    }
+    ParseInfoScope parseInfo(factory_, messages_, typeNameRegistry_);
+    if (!typeNameRegistry_->loadTypedefs())
+        return false;
+    InputFiles input;
+    if (!input_->collectInputFiles(input.files))
+        return false;
+
+    KsCItfApplication* application = factory_->createApplication();
+    bool allParsed = true;
+    for (const KsCItfInputFile* file : input.files) {
+        KsCItfParser parser(kParserDepth);
+        KsCItfScanner scanner;
+        parseInfo->setSuccess(true);
+        parseInfo->setRoot(nullptr);
+        parseInfo->setFileName(file->getBaseName());
+        scanner.setInput(file->contentText());
+        bool accepted = parser.parse(&scanner) == 0;
+        KsCItfTranslationUnit* unit = parseInfo->getRoot();
+        if (accepted && parseInfo->isSuccess() && unit) {
+            unit->ModuleName = file->getBaseName();
+            application->TranslationUnit.push_back(unit);
+            unit->setParent(application);
+        } else {
+            // Every file is parsed, so that one run reports the syntax errors of all of them.
+            allParsed = false;
+        }
+    }
+    if (!allParsed)
+        return false;
+    if (options_ && options_->getICodeTestDumpTree())
+        dumpApplication(application);
+    // The hand-over to the ICode generator joins here.
+    return true;
+}
+
+void KsCItfControl::dumpApplication(KsCItfApplication* application) {
+    KS_DumpTree dump(GLB_GetHtmlColorServer());
+    dump.setMasterFile("ItfApplication.html", "Title");
+    dump.addProperty("Application", application, KS_Dump::ConnectType(0));
+    dump.closeAllFiles();
+}

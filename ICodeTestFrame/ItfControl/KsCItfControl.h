@@ -20,6 +20,7 @@ class KsCItfExprLocationDB;
 class KsCItfSrcRefServer;
 class KsCItfIterationContextServer;
 class KsCItfAdditionalInfoEvaluator;
+class KsCItfApplication;
 
 class KsCItfControl : public KsCItfControlIF, public KsCItfObject {
 public:
@@ -60,4 +61,6 @@ private:
     bool initServers(KS_ICodeFactoryContainer* container, KS_ExprDescrComponent* exprDescr,
                      KsCCodeViewData* codeViewData, KS_ExprDescrTupelServer* tupelServer);
     bool runTests();
+    // Writes the syntax trees of a run as HTML pages, "ItfApplication.html" the first.
+    void dumpApplication(KsCItfApplication* application);
 };

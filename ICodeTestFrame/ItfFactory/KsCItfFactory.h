@@ -47,6 +47,10 @@ public:
     const char* intern(std::string_view text) { return pool_.intern(text); }
 
     std::size_t objectCount() const { return dumpables_.size() + strings_.size(); }
+    // Nodes and source positions in creation order.
+    const std::vector<KS_Dumpable*, KsCItfAllocator<KS_Dumpable*>>& dumpables() const {
+        return dumpables_;
+    }
 
 protected:
     template <class T, class... Args> T* make(Args&&... args) {

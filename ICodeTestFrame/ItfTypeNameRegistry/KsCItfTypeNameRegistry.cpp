@@ -49,6 +49,9 @@ void KsCItfTypeNameRegistry::addTypeName(const ZnCXString& name) {
 }
 
 bool KsCItfTypeNameRegistry::loadTypedefs() {
+    // Each run loads the dictionary anew.
+    names_.clear();
+    lookup_.clear();
     if (loadSubtree("/Pool/Typedefs", 0)) {
         addTypeName("UNDEFINED_TYPE");
         return true;

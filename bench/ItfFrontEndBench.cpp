@@ -1,0 +1,110 @@
+// Front-end throughput: scanning alone, and scanning with parsing into syntax trees, over a
+// generated suite of many files with thousands of lines each.
+#include "ItfFactory/KsCItfFactory.h"
+#include "ItfMessages/KsCItfMessages.h"
+#include "ItfParser/KsCItfParser.h"
+#include "ItfScanner/KsCItfScanner.h"
+#include "ItfSrcRef/KsCItfParseInfo.h"
+#include "ItfSuiteGenerator.h"
+#include "ItfTypeNameRegistry/KsCItfTypeNameRegistry.h"
+#include "KsCHostMemController.h"
+#include "KsCHostMessageServer.h"
+
+#include <benchmark/benchmark.h>
+
+#include <cstdio>
+#include <sys/resource.h>
+
+namespace {
+
+struct FrontEnd {
+    KsCHostMemController memory;
+    KsCItfFactory factory;
+    KsCItfMessages messages;
+    KsCItfTypeNameRegistry registry;
+    KsCItfParseInfo info;
+
+    FrontEnd() {
+        pKSMemory = &memory;
+        KsCHostMessageServer::setScannerOutput(nullptr);
+        messages.init(nullptr, &factory);
+        for (const char* name : {"sint8", "uint8", "sint16", "uint16", "sint32", "uint32",
+                                 "float32", "float64", "boolean", "UNDEFINED_TYPE"})
+            registry.addTypeName(name);
+        info.setFactory(&factory);
+        info.setMessages(&messages);
+        info.setTypeNameRegistry(&registry);
+        theParseInfo = &info;
+    }
+    ~FrontEnd() {
+        theParseInfo = nullptr;
+        factory.exit();
+        pKSMemory = nullptr;
+    }
+};
+
+const std::vector<ItfGeneratedFile>& suite() {
+    static const std::vector<ItfGeneratedFile> files = generateSuite(20, 5000);
+    return files;
+}
+
+std::size_t suiteBytes() {
+    std::size_t bytes = 0;
+    for (const auto& file : suite())
+        bytes += file.text.size();
+    return bytes;
+}
+
+void BM_Scan(benchmark::State& state) {
+    FrontEnd frontEnd;
+    std::size_t tokens = 0;
+    for (auto _ : state) {
+        for (const auto& file : suite()) {
+            frontEnd.info.setFileName(file.name);
+            KsCItfScanner scanner;
+            scanner.setInput(file.text.c_str());
+            while (scanner.lex() > 0)
+                ++tokens;
+        }
+        frontEnd.factory.exit();
+    }
+    state.SetBytesProcessed(static_cast<int64_t>(state.iterations() * suiteBytes()));
+    state.counters["tokens/s"] =
+        benchmark::Counter(static_cast<double>(tokens), benchmark::Counter::kIsRate);
+}
+
+void BM_ScanParse(benchmark::State& state) {
+    FrontEnd frontEnd;
+    std::size_t nodes = 0;
+    for (auto _ : state) {
+        for (const auto& file : suite()) {
+            frontEnd.info.setSuccess(true);
+            frontEnd.info.setFileName(file.name);
+            KsCItfScanner scanner;
+            scanner.setInput(file.text.c_str());
+            KsCItfParser parser(150);
+            if (parser.parse(&scanner) != 0 || !frontEnd.info.isSuccess()) {
+                state.SkipWithError("the generated suite does not parse");
+                return;
+            }
+        }
+        nodes += frontEnd.factory.dumpables().size();
+        frontEnd.factory.exit();
+    }
+    state.SetBytesProcessed(static_cast<int64_t>(state.iterations() * suiteBytes()));
+    state.counters["objects/s"] =
+        benchmark::Counter(static_cast<double>(nodes), benchmark::Counter::kIsRate);
+    state.counters["module_peak_MiB"] =
+        static_cast<double>(frontEnd.memory.peakBytes()) / (1024.0 * 1024.0);
+    state.counters["suite_MiB"] = static_cast<double>(suiteBytes()) / (1024.0 * 1024.0);
+    rusage usage{};
+    getrusage(RUSAGE_SELF, &usage);
+    state.counters["process_peak_MiB"] = static_cast<double>(usage.ru_maxrss) / 1024.0;
+}
+
+BENCHMARK(BM_Scan)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_ScanParse)->Unit(benchmark::kMillisecond);
+
+} // namespace
+
+BENCHMARK_MAIN();
