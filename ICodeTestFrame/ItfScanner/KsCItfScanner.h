@@ -23,7 +23,8 @@ public:
 
     // The next token code, 0 at the end of the input; theTokenValue holds the value of
     // CONSTANT, IDENTIFIER, TYPE_NAME and STRING_LITERAL. After an error of its own (a token
-    // buffer overflow) the scanner has reported it and answers LEX_ERROR.
+    // buffer overflow) the scanner has reported it and answers LEX_ERROR; the rest of the file
+    // is not scanned, later calls answer 0.
     int lex();
 
     // Reports `text` as a syntax error of the current file at the current line and column and
@@ -36,6 +37,9 @@ public:
     const char* getTokenText();
 
 private:
+    void skipComment(const unsigned char*& cur);
+    void skipWhitespace(const unsigned char* from, const unsigned char*& cur);
+
     const char* cursor_ = nullptr; // first unread character
     const char* token_ = nullptr;  // start of the current token
     std::size_t tokenLength_ = 0;
