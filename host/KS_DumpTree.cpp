@@ -3,6 +3,8 @@
 #include "ItfHostInterface/KS_Dump.h"
 
 #include <cstdio>
+#include <cstdlib>
+#include <cxxabi.h>
 #include <deque>
 #include <filesystem>
 #include <fstream>
@@ -35,6 +37,16 @@ std::string escaped(std::string_view text) {
         }
     }
     return out;
+}
+
+// The object's class as the program names it, for page names and link texts.
+std::string classNameOf(KS_Dumpable* object) {
+    int status = 0;
+    const char* mangled = typeid(*object).name();
+    char* name = abi::__cxa_demangle(mangled, nullptr, nullptr, &status);
+    std::string text = status == 0 && name ? name : mangled;
+    std::free(name);
+    return text;
 }
 
 class PaletteColorServer : public KS_HtmlColorServer {
@@ -89,7 +101,7 @@ struct KS_DumpTree::Impl {
             return found->second;
         std::string name = object->getDumpFileName().str();
         if (name.empty())
-            name = "ItfObject" + std::to_string(++nextPage) + ".html";
+            name = classNameOf(object) + "_" + std::to_string(++nextPage) + ".html";
         pages.emplace(object, name);
         pending.push_back(object);
         return name;
@@ -98,9 +110,10 @@ struct KS_DumpTree::Impl {
     void open(const std::string& name, const std::string& heading) {
         pageName = name;
         page = "<!DOCTYPE html>\n<html><head><meta charset=\"utf-8\"><title>" + escaped(heading) +
-               "</title>\n<style>body{font-family:sans-serif}table{border-collapse:collapse}"
-               "td{border:1px solid #ccc;padding:2px 8px;vertical-align:top}"
-               "div.section{border:1px solid #999;margin:6px 0;padding:4px 8px}</style>"
+               "</title>\n<style>body{font-family:sans-serif}"
+               "div.section{border:1px solid #999;margin:6px 0;padding:4px 8px}"
+               "div.class{font-weight:bold;margin-bottom:4px}"
+               "span.key{display:inline-block;min-width:16em;color:#555}</style>"
                "</head><body>\n";
         if (name != masterFile)
             page += "<p><a href=\"" + escaped(masterFile) + "\">" + escaped(title) +
@@ -118,16 +131,17 @@ struct KS_DumpTree::Impl {
     }
 
     void endSection() {
-        page += "</table></div>\n";
+        page += "</div>\n";
         --depth;
     }
 
     void row(const ZnCXString& name, const std::string& valueHtml) {
         if (depth == 0) {
-            page += "<div class=\"section\"><table>\n";
+            page += "<div class=\"section\">\n";
             ++depth;
         }
-        page += "<tr><td>" + escaped(name.view()) + "</td><td>" + valueHtml + "</td></tr>\n";
+        page += "<div><span class=\"key\">" + escaped(name.view()) + "</span> <span>" +
+                valueHtml + "</span></div>\n";
     }
 
     void link(const ZnCXString& name, KS_Dumpable* object) {
@@ -138,7 +152,7 @@ struct KS_DumpTree::Impl {
         std::string target = pageOf(object);
         std::string text = object->getLinkNameForDump().str();
         if (text.empty())
-            text = target.substr(0, target.size() - 5);
+            text = classNameOf(object);
         row(name, "<a href=\"" + escaped(target) + "\">" + escaped(text) + "</a>");
     }
 };
@@ -186,8 +200,8 @@ void KS_DumpTree::addProperty(const ZnCXString& name, KS_Dumpable* object, Conne
 
 void KS_DumpTree::beginSection(const char* className) {
     std::string color = impl_->colors ? impl_->colors->colorOf(className).str() : "#ffffff";
-    impl_->page += "<div class=\"section\" style=\"background:" + escaped(color) + "\"><b>" +
-                   escaped(className ? className : "") + "</b><table>\n";
+    impl_->page += "<div class=\"section\" style=\"background:" + escaped(color) +
+                   "\"><div class=\"class\">" + escaped(className ? className : "") + "</div>\n";
     ++impl_->depth;
 }
 

@@ -19,8 +19,9 @@ bool KsCItfFactory::exit() {
     for (KsCItfString* string : strings_)
         if (string)
             string->~KsCItfString();
-    dumpables_ = {};
-    strings_ = {};
+    // Swapping with empty lists returns their storage too.
+    decltype(dumpables_)().swap(dumpables_);
+    decltype(strings_)().swap(strings_);
     while (blocks_) {
         Block* next = blocks_->next;
         itf::release(blocks_);

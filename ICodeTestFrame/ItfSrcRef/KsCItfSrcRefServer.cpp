@@ -9,8 +9,7 @@ bool KsCItfSrcRefServer::init(KsCSrcRefServer* hostServer) {
 }
 
 bool KsCItfSrcRefServer::exit() {
-    hostReferences_.clear();
-    hostReferences_.shrink_to_fit();
+    decltype(hostReferences_)().swap(hostReferences_);
     return true;
 }
 

@@ -1,4 +1,5 @@
 #include "ItfFactory/KsCItfFactory.h"
+#include "ItfSrcRef/KsCItfSrcRef.h"
 #include "ItfTestSupport.h"
 
 namespace {
@@ -32,6 +33,15 @@ int answeringBaseDowncasts(KsCItfNonTerminal* node, KsCItfNonTerminal*& answer) 
     return count;
 }
 
+// How many production downcasts of its non-terminal answer for a node.
+#define ITF_COUNT_SIBLING(NT, Production, Children) count += node->as##NT##_##Production() != nullptr;
+#define ITF_SIBLING_COUNTER(Name, Downcast, Children)                                          \
+    [[maybe_unused]] int answeringProductionDowncasts(KsCItf##Name* node) {                    \
+        int count = 0;                                                                         \
+        ITF_PRODUCTIONS_##Name(ITF_COUNT_SIBLING) return count;                                \
+    }
+ITF_NONTERMINALS(ITF_COUNT_NOTHING, ITF_SIBLING_COUNTER)
+
 class KsCItfSyntaxTreeNodeTest : public ItfHostTest {
 protected:
     KsCItfFactory factory;
@@ -40,19 +50,17 @@ protected:
 
 TEST_F(KsCItfSyntaxTreeNodeTest, EveryNodeAnswersOnlyItsOwnDowncasts) {
     int checked = 0;
-#define ITF_CHECK_SIBLING(NT, Production, Children)                                            \
-    siblings += node->as##NT##_##Production() != nullptr;
 #define ITF_CHECK_PRODUCTION(NT, Production, Children)                                         \
     {                                                                                          \
         auto* node = factory.create##NT##_##Production();                                      \
         EXPECT_EQ(node->as##NT##_##Production(), node) << #NT "_" #Production;                 \
-        int siblings = 0;                                                                      \
-        ITF_PRODUCTIONS_##NT(ITF_CHECK_SIBLING) EXPECT_EQ(siblings, 1) << #NT "_" #Production; \
+        EXPECT_EQ(answeringProductionDowncasts(node), 1) << #NT "_" #Production;               \
         KsCItfNonTerminal* answer = nullptr;                                                   \
         int answers = answeringBaseDowncasts(node, answer);                                    \
         EXPECT_LE(answers, 1) << #NT "_" #Production;                                          \
-        if (answers == 1)                                                                      \
+        if (answers == 1) {                                                                    \
             EXPECT_EQ(answer, static_cast<KsCItfNonTerminal*>(node)) << #NT "_" #Production;   \
+        }                                                                                      \
         ++checked;                                                                             \
     }
 #define ITF_CHECK_ABSTRACT(Name, Downcast, Children) ITF_PRODUCTIONS_##Name(ITF_CHECK_PRODUCTION)

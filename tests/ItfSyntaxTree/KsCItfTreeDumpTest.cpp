@@ -48,26 +48,26 @@ TEST_F(KsCItfTreeDumpTest, EveryNodeAndPositionGetsALinkedPage) {
     for ([[maybe_unused]] const auto& entry : std::filesystem::directory_iterator(dir.path()))
         ++pages;
     // Every node and every position, the application (without a position) and the master.
-    std::size_t nodes = nodes<KsCItfNonTerminal>().size();
-    std::size_t positions = nodes<KsCItfSrcRef>().size();
-    EXPECT_EQ(pages, nodes + positions + 1);
+    std::size_t nodeCount = nodes<KsCItfNonTerminal>().size();
+    std::size_t positionCount = nodes<KsCItfSrcRef>().size();
+    EXPECT_EQ(pages, nodeCount + positionCount + 1);
 
     std::string loop = pageWith("<h1>KsCItfIterationStatement_WHILE_Qualified</h1>");
     ASSERT_FALSE(loop.empty());
-    EXPECT_NE(loop.find("<td>AdditionalInfo_LoopInfo</td><td>---</td>"), std::string::npos);
-    EXPECT_NE(loop.find("<td>AdditionalInfo_IcInfo</td><td><a href="), std::string::npos);
+    EXPECT_NE(loop.find("<span class=\"key\">AdditionalInfo_LoopInfo</span> <span>---</span>"), std::string::npos);
+    EXPECT_NE(loop.find("<span class=\"key\">AdditionalInfo_IcInfo</span> <span><a href=\"KsCItfAdditionalInfo_IcInfo_"), std::string::npos);
     EXPECT_NE(loop.find("Debug Idx"), std::string::npos);
     EXPECT_NE(loop.find("ItfApplication.html"), std::string::npos);
 
     std::string app = pageWith("<h1>KsCItfApplication</h1>");
     EXPECT_EQ(app.find("SrcRef"), std::string::npos);
-    EXPECT_NE(app.find("<td>TranslationUnit</td>"), std::string::npos);
+    EXPECT_NE(app.find("<span class=\"key\">TranslationUnit</span>"), std::string::npos);
 
     std::string position = pageWith("<h1>KsCItfSrcRef</h1>");
-    EXPECT_NE(position.find("<td>Module</td><td>t</td>"), std::string::npos);
+    EXPECT_NE(position.find("<span class=\"key\">Module</span> <span>t</span>"), std::string::npos);
 
     std::string unitPage = pageWith("<h1>KsCItfTranslationUnit</h1>");
-    EXPECT_NE(unitPage.find("<td>ModuleName</td><td></td>"), std::string::npos);
+    EXPECT_NE(unitPage.find("<span class=\"key\">ModuleName</span> <span></span>"), std::string::npos);
 }
 
 TEST_F(KsCItfTreeDumpTest, QualifiedOperatorsWriteTheirPropertiesAndEmptyListsNothing) {
@@ -80,12 +80,12 @@ TEST_F(KsCItfTreeDumpTest, QualifiedOperatorsWriteTheirPropertiesAndEmptyListsNo
     holder->TranslationUnit.push_back(unit);
     dump(qualified);
     std::string text = pageWith("<h1>KsCItfQualifiedUnaryOperator_Minus</h1>");
-    EXPECT_NE(text.find("<b>KsCItfQualifiedUnaryOperator</b>"), std::string::npos);
-    EXPECT_NE(text.find("<td>AdditionalInfoPropertyValueList</td>"), std::string::npos);
+    EXPECT_NE(text.find("<div class=\"class\">KsCItfQualifiedUnaryOperator</div>"), std::string::npos);
+    EXPECT_NE(text.find("<span class=\"key\">AdditionalInfoPropertyValueList</span>"), std::string::npos);
     EXPECT_EQ(text.find("SrcRef"), std::string::npos);
     dump(list);
     std::string specifiers = pageWith("<h1>KsCItfDeclarationSpecifiers</h1>");
-    EXPECT_EQ(specifiers.find("<td>TypeSpecifier</td>"), std::string::npos);
+    EXPECT_EQ(specifiers.find("<span class=\"key\">TypeSpecifier</span>"), std::string::npos);
 }
 
 } // namespace
