@@ -5,7 +5,7 @@
 #include <cstdint>
 
 namespace {
-constexpr std::size_t kArenaBlockSize = 256 * 1024;
+constexpr std::size_t kArenaBlockSize = 1024 * 1024;
 }
 
 KsCItfFactory::~KsCItfFactory() { exit(); }
@@ -19,9 +19,8 @@ bool KsCItfFactory::exit() {
     for (KsCItfString* string : strings_)
         if (string)
             string->~KsCItfString();
-    // Swapping with empty lists returns their storage too.
-    decltype(dumpables_)().swap(dumpables_);
-    decltype(strings_)().swap(strings_);
+    dumpables_.clear();
+    strings_.clear();
     while (blocks_) {
         Block* next = blocks_->next;
         itf::release(blocks_);

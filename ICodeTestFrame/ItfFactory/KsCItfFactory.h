@@ -4,6 +4,7 @@
 #pragma once
 
 #include "ItfControl/KsCItfMemory.h"
+#include "ItfFactory/KsCItfOwnerList.h"
 #include "ItfFactory/KsCItfString.h"
 #include "ItfFactory/KsCItfTextPool.h"
 #include "ItfHostInterface/KS_Dump.h"
@@ -48,18 +49,16 @@ public:
 
     std::size_t objectCount() const { return dumpables_.size() + strings_.size(); }
     // Nodes and source positions in creation order.
-    const std::vector<KS_Dumpable*, KsCItfAllocator<KS_Dumpable*>>& dumpables() const {
-        return dumpables_;
-    }
+    const KsCItfOwnerList<KS_Dumpable>& dumpables() const { return dumpables_; }
 
 protected:
     template <class T, class... Args> T* make(Args&&... args) {
         // The slot is taken first, so that an object never exists without its owner entry.
         auto& owners = ownersOf<T>();
-        owners.push_back(nullptr);
+        owners.reserveSlot();
         void* place = allocateInArena(sizeof(T), alignof(T));
         T* object = new (place) T(std::forward<Args>(args)...);
-        owners.back() = object;
+        owners.setLast(object);
         return object;
     }
 
@@ -78,7 +77,7 @@ private:
     Block* blocks_ = nullptr;
     char* cursor_ = nullptr;
     char* limit_ = nullptr;
-    std::vector<KS_Dumpable*, KsCItfAllocator<KS_Dumpable*>> dumpables_;
-    std::vector<KsCItfString*, KsCItfAllocator<KsCItfString*>> strings_;
+    KsCItfOwnerList<KS_Dumpable> dumpables_;
+    KsCItfOwnerList<KsCItfString> strings_;
     KsCItfTextPool pool_;
 };

@@ -58,3 +58,51 @@ TEST(ItfRunTest, HelpAndVersionExitWithZero) {
 }
 
 } // namespace
+
+namespace {
+
+TEST(ItfRunTest, SyntaxErrorsAreMessagesAndAFailedRun) {
+    ItfTempDir dir;
+    dir.write("a.itf", "int f() { x = ; }\n");
+    dir.write("b.itf", "int ok; /* a comment body that must not reach the output */\n");
+    auto json = runCommand(itfRun("--format json " + dir.path().string()));
+    EXPECT_EQ(json.status, 1);
+    auto document = nlohmann::json::parse(json.out);
+    EXPECT_EQ(document["result"], false);
+    EXPECT_EQ(document["init"], true);
+    EXPECT_EQ(document["exit"], true);
+    ASSERT_EQ(document["messages"].size(), 1u);
+    auto message = document["messages"][0];
+    EXPECT_EQ(message["number"], 38000);
+    EXPECT_EQ(message["severity"], 2);
+    EXPECT_EQ(message["heading"], "ICode Test Frame Messages");
+    EXPECT_EQ(message["text"], "ICode test frame error: Syntax error in file a, line 1, column 15: "
+                               "Syntax error");
+
+    auto text = runCommand(itfRun(dir.path().string() + " 2>&1"));
+    EXPECT_EQ(text.status, 1);
+    EXPECT_EQ(text.out, "error 38000: ICode test frame error: Syntax error in file a, line 1, "
+                        "column 15: Syntax error\n");
+}
+
+TEST(ItfRunTest, DumpTreeWritesBrowsablePages) {
+    ItfTempDir dir;
+    ItfTempDir pages;
+    dir.write("a.itf", "int f() { x = 1; }\n");
+    auto r = runCommand(itfRun("--dump-tree " + (pages.path() / "out").string() + " " +
+                               dir.path().string()));
+    EXPECT_EQ(r.status, 0);
+    EXPECT_TRUE(std::filesystem::exists(pages.path() / "out" / "ItfApplication.html"));
+    int count = 0;
+    for ([[maybe_unused]] const auto& entry :
+         std::filesystem::directory_iterator(pages.path() / "out"))
+        ++count;
+    EXPECT_GT(count, 30);
+    // Nothing is written into the folder of the test files.
+    int inTests = 0;
+    for ([[maybe_unused]] const auto& entry : std::filesystem::directory_iterator(dir.path()))
+        ++inTests;
+    EXPECT_EQ(inTests, 1);
+}
+
+} // namespace
