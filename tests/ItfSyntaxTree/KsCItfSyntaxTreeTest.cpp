@@ -48,27 +48,34 @@ protected:
     ~KsCItfSyntaxTreeNodeTest() override { factory.exit(); }
 };
 
+// A node of a production answers its production's downcast with itself, no sibling's, and
+// of the base's downcasts at most its non-terminal's, again with itself.
+void expectOwnDowncasts(KsCItfNonTerminal* node, KsCItfNonTerminal* ownAnswer,
+                        int productionAnswers, const char* name) {
+    EXPECT_EQ(ownAnswer, node) << name;
+    EXPECT_EQ(productionAnswers, 1) << name;
+    KsCItfNonTerminal* answer = nullptr;
+    int answers = answeringBaseDowncasts(node, answer);
+    EXPECT_LE(answers, 1) << name;
+    if (answers == 1) {
+        EXPECT_EQ(answer, node) << name;
+    }
+}
+
 TEST_F(KsCItfSyntaxTreeNodeTest, EveryNodeAnswersOnlyItsOwnDowncasts) {
     int checked = 0;
 #define ITF_CHECK_PRODUCTION(NT, Production, Children)                                         \
     {                                                                                          \
         auto* node = factory.create##NT##_##Production();                                      \
-        EXPECT_EQ(node->as##NT##_##Production(), node) << #NT "_" #Production;                 \
-        EXPECT_EQ(answeringProductionDowncasts(node), 1) << #NT "_" #Production;               \
-        KsCItfNonTerminal* answer = nullptr;                                                   \
-        int answers = answeringBaseDowncasts(node, answer);                                    \
-        EXPECT_LE(answers, 1) << #NT "_" #Production;                                          \
-        if (answers == 1) {                                                                    \
-            EXPECT_EQ(answer, static_cast<KsCItfNonTerminal*>(node)) << #NT "_" #Production;   \
-        }                                                                                      \
+        expectOwnDowncasts(node, node->as##NT##_##Production(),                                \
+                           answeringProductionDowncasts(node), #NT "_" #Production);           \
         ++checked;                                                                             \
     }
 #define ITF_CHECK_ABSTRACT(Name, Downcast, Children) ITF_PRODUCTIONS_##Name(ITF_CHECK_PRODUCTION)
 #define ITF_CHECK_SINGLE(Name, Downcast, Children)                                             \
     {                                                                                          \
-        auto* node = factory.create##Name();                                                   \
         KsCItfNonTerminal* answer = nullptr;                                                   \
-        EXPECT_EQ(answeringBaseDowncasts(node, answer), Downcast) << #Name;                    \
+        EXPECT_EQ(answeringBaseDowncasts(factory.create##Name(), answer), Downcast) << #Name;  \
         ++checked;                                                                             \
     }
     ITF_NONTERMINALS(ITF_CHECK_SINGLE, ITF_CHECK_ABSTRACT)
