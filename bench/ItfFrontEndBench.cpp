@@ -13,6 +13,9 @@
 #include <benchmark/benchmark.h>
 
 #include <cstdio>
+#include <filesystem>
+#include <fstream>
+#include <string_view>
 #include <sys/resource.h>
 
 namespace {
@@ -107,4 +110,19 @@ BENCHMARK(BM_ScanParse)->Unit(benchmark::kMillisecond);
 
 } // namespace
 
-BENCHMARK_MAIN();
+// `itf-bench --write-suite DIR` writes the generated suite as test files, for timing whole
+// runs of itf-run over it; without it the benchmarks run.
+int main(int argc, char** argv) {
+    if (argc == 3 && std::string_view(argv[1]) == "--write-suite") {
+        std::filesystem::create_directories(argv[2]);
+        for (const auto& file : suite())
+            std::ofstream(std::filesystem::path(argv[2]) / file.name, std::ios::binary)
+                << file.text;
+        std::printf("%zu files, %zu bytes\n", suite().size(), suiteBytes());
+        return 0;
+    }
+    benchmark::Initialize(&argc, argv);
+    benchmark::RunSpecifiedBenchmarks();
+    benchmark::Shutdown();
+    return 0;
+}

@@ -133,6 +133,8 @@ bool KsCItfControl::runTests() {
     ParseInfoScope parseInfo(factory_, messages_, typeNameRegistry_);
     if (!typeNameRegistry_->loadTypedefs())
         return false;
+    if (dumpWanted())
+        typeNameRegistry_->dump();
     InputFiles input;
     if (!input_->collectInputFiles(input.files))
         return false;
@@ -159,11 +161,13 @@ bool KsCItfControl::runTests() {
     }
     if (!allParsed)
         return false;
-    if (options_ && options_->getICodeTestDumpTree())
+    if (dumpWanted())
         dumpApplication(application);
     // The hand-over to the ICode generator joins here.
     return true;
 }
+
+bool KsCItfControl::dumpWanted() const { return options_ && options_->getICodeTestDumpTree(); }
 
 void KsCItfControl::dumpApplication(KsCItfApplication* application) {
     KS_DumpTree dump(GLB_GetHtmlColorServer());

@@ -2,7 +2,6 @@
 
 #include "ItfSrcRef/KsCItfSrcRef.h"
 
-#include <cstdint>
 
 namespace {
 constexpr std::size_t kArenaBlockSize = 1024 * 1024;
@@ -31,25 +30,13 @@ bool KsCItfFactory::exit() {
     return true;
 }
 
-void* KsCItfFactory::allocateInArena(std::size_t size, std::size_t alignment) {
-    auto aligned = [alignment](char* p) {
-        auto address = reinterpret_cast<std::uintptr_t>(p);
-        return reinterpret_cast<char*>((address + alignment - 1) & ~(alignment - 1));
-    };
-    char* place = cursor_ ? aligned(cursor_) : nullptr;
-    if (!place || place + size > limit_) {
-        std::size_t blockSize = size + alignment + sizeof(Block) > kArenaBlockSize
-                                    ? size + alignment + sizeof(Block)
-                                    : kArenaBlockSize;
-        auto* block = static_cast<Block*>(itf::allocate(blockSize));
-        block->next = blocks_;
-        blocks_ = block;
-        cursor_ = reinterpret_cast<char*>(block + 1);
-        limit_ = reinterpret_cast<char*>(block) + blockSize;
-        place = aligned(cursor_);
-    }
-    cursor_ = place + size;
-    return place;
+void KsCItfFactory::startBlock(std::size_t size) {
+    std::size_t blockSize = sizeof(Block) + (size > kArenaBlockSize ? size : kArenaBlockSize);
+    auto* block = static_cast<Block*>(itf::allocate(blockSize));
+    block->next = blocks_;
+    blocks_ = block;
+    cursor_ = reinterpret_cast<char*>(block + 1);
+    limit_ = reinterpret_cast<char*>(block) + blockSize;
 }
 
 KsCItfSrcRef* KsCItfFactory::createSrcRef() { return make<KsCItfSrcRef>(&pool_); }

@@ -54,9 +54,10 @@ public:
 protected:
     template <class T, class... Args> T* make(Args&&... args) {
         // The slot is taken first, so that an object never exists without its owner entry.
+        static_assert(alignof(T) <= kArenaAlignment);
         auto& owners = ownersOf<T>();
         owners.reserveSlot();
-        void* place = allocateInArena(sizeof(T), alignof(T));
+        void* place = allocateInArena((sizeof(T) + kArenaAlignment - 1) & ~(kArenaAlignment - 1));
         T* object = new (place) T(std::forward<Args>(args)...);
         owners.setLast(object);
         return object;
@@ -69,7 +70,17 @@ private:
         else
             return strings_;
     }
-    void* allocateInArena(std::size_t size, std::size_t alignment);
+    static constexpr std::size_t kArenaAlignment = alignof(void*);
+
+    // `size` is a multiple of the arena's alignment, which every block start has too.
+    void* allocateInArena(std::size_t size) {
+        if (static_cast<std::size_t>(limit_ - cursor_) < size)
+            startBlock(size);
+        void* place = cursor_;
+        cursor_ += size;
+        return place;
+    }
+    void startBlock(std::size_t size);
 
     struct Block {
         Block* next;
