@@ -12,7 +12,7 @@
 #include "ItfSrcRef/KsCItfSrcRefServer.h"
 #include "ItfTypeNameRegistry/KsCItfTypeNameRegistry.h"
 
-#include <new>
+#include <exception>
 
 namespace {
 
@@ -87,7 +87,8 @@ bool KsCItfControl::init(KS_ICodeFactoryContainer* container, KS_ExprDescrCompon
     options_ = options;
     try {
         return initServers(container, exprDescr, codeViewData, tupelServer);
-    } catch (const std::bad_alloc&) {
+    } catch (const std::exception&) {
+        // Exhausted memory above all: reported here, never thrown into the host.
         reportInternalError("KsCItfControl", 101);
         return false;
     }
@@ -119,7 +120,7 @@ bool KsCItfControl::exit() {
 bool KsCItfControl::run() {
     try {
         return runTests();
-    } catch (const std::bad_alloc&) {
+    } catch (const std::exception&) {
         reportInternalError("KsCItfControl", 102);
         return false;
     }

@@ -43,25 +43,17 @@ union KsUItfParserValue {
 
 #include <new>
 
-/* The stacks start small and grow to the parser's depth, through the module's allocation
-   pair; a deeper parse is a stack overflow. */
+/* The stacks start small and grow to the parser's depth in blocks that the parser object
+   owns; a deeper parse is a stack overflow. */
 #define YYINITDEPTH 20
 #define YYMAXDEPTH (parser->getDepth())
-#define YYMALLOC itfStackAllocate
-#define YYFREE itf::release
+#define YYMALLOC(size) (parser->allocateStack(size))
+#define YYFREE(block) (parser->releaseStack(block))
 
 /* The generated parser carries helpers this grammar does not call. */
 #pragma GCC diagnostic ignored "-Wunused-function"
 
 namespace {
-
-void* itfStackAllocate(std::size_t size) {
-    try {
-        return itf::allocate(size);
-    } catch (const std::bad_alloc&) {
-        return nullptr;
-    }
-}
 
 constexpr const char* kParserSource = "ICodeTestFrame/ItfParser/ITF_Parser";
 
@@ -1319,6 +1311,35 @@ static int yyreport_syntax_error(const yypcontext_t*, KsCItfParser*, KsCItfScann
 }
 
 KsCItfParser::KsCItfParser(int depth) : depth_(depth < kMinDepth ? kMinDepth : depth) {}
+
+KsCItfParser::~KsCItfParser() {
+    for (void* block : stackBlocks_)
+        itf::release(block);
+}
+
+/* Null when no memory is left: the generated parser then reports its stack as exhausted. */
+void* KsCItfParser::allocateStack(std::size_t size) {
+    for (void*& slot : stackBlocks_) {
+        if (!slot) {
+            try {
+                slot = itf::allocate(size);
+            } catch (const std::bad_alloc&) {
+                return nullptr;
+            }
+            return slot;
+        }
+    }
+    return nullptr;
+}
+
+void KsCItfParser::releaseStack(void* block) {
+    for (void*& slot : stackBlocks_) {
+        if (slot == block) {
+            itf::release(slot);
+            slot = nullptr;
+        }
+    }
+}
 
 int KsCItfParser::parse(KsCItfScanner* scanner) {
     if (!scanner || !theParseInfo || !theParseInfo->getFactory()) {

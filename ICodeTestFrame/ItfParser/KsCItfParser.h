@@ -6,6 +6,8 @@
 
 #include "ItfControl/KsCItfMemory.h"
 
+#include <cstddef>
+
 class KsCItfScanner;
 
 class KsCItfParser : public KsCItfObject {
@@ -15,7 +17,8 @@ public:
 
     // `depth`: the most states the stack may hold; deeper nesting is a "Parser stack overflow".
     explicit KsCItfParser(int depth);
-    virtual ~KsCItfParser() = default;
+    // Also returns stacks that a parse abandoned by an exception left behind.
+    virtual ~KsCItfParser();
 
     // 0 when the input was accepted, 1 when the parse was abandoned. The translation unit is
     // reached through the parse info's root.
@@ -23,6 +26,12 @@ public:
 
     int getDepth() const { return depth_; }
 
+    // The generated parser's stacks grow through these, so that the parser object owns them.
+    void* allocateStack(std::size_t size);
+    void releaseStack(void* block);
+
 private:
     int depth_;
+    // While the stacks grow, the old and the new block exist at the same time.
+    void* stackBlocks_[2] = {nullptr, nullptr};
 };

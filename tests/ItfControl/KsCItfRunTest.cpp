@@ -101,3 +101,66 @@ TEST_F(KsCItfRunTest, TreesOfSeveralRunsAreReleasedByExit) {
 }
 
 } // namespace
+
+namespace {
+
+// A host memory controller that runs dry after a given number of blocks.
+class ExhaustedMemory : public KsCHostMemController {
+public:
+    explicit ExhaustedMemory(std::size_t budget) : budget_(budget) {}
+    void* allocMemBlock(std::size_t size) override {
+        return totalBlocks() >= budget_ ? nullptr : KsCHostMemController::allocMemBlock(size);
+    }
+
+private:
+    std::size_t budget_;
+};
+
+// Runs the control over the current directory with the given controller; the run's result.
+bool runWith(KsCHostMemController& memory) {
+    KsCHostMessageServer::instance().clear();
+    pKSMemory = &memory;
+    bool result;
+    {
+        KsCHostCodeModel model(KsCHostConfig::embeddedDefault());
+        KsCHostOptions options;
+        KsCItfControl control;
+        EXPECT_TRUE(control.init(model.container(), model.exprDescrComponent(),
+                                 model.codeViewData(), model.tupelServer(), &options));
+        result = control.run();
+        EXPECT_EQ(theParseInfo, nullptr);
+        EXPECT_TRUE(control.exit());
+    }
+    pKSMemory = nullptr;
+    return result;
+}
+
+TEST(KsCItfRunMemoryTest, ExhaustedMemoryIsAnInternalErrorAndNothingLeaks) {
+    ItfTempDir dir;
+    std::string text;
+    // Nested deep enough that the parser's stacks grow.
+    const std::string nested = std::string(25, '(') + "a" + std::string(25, ')');
+    for (int i = 0; i < 2000; ++i)
+        text += "int f" + std::to_string(i) + "() { x = " + nested + " * c[IC_INFO(IC = ic)]; }\n";
+    dir.write("big.itf", text);
+    auto previous = std::filesystem::current_path();
+    std::filesystem::current_path(dir.path());
+
+    KsCHostMemController plenty;
+    ASSERT_TRUE(runWith(plenty));
+    const std::size_t needed = plenty.totalBlocks();
+    // Memory runs out at points spread over the whole run, the parse included.
+    for (std::size_t budget = 5; budget < needed; budget += needed / 12 + 1) {
+        ExhaustedMemory memory(budget);
+        EXPECT_FALSE(runWith(memory)) << budget;
+        EXPECT_EQ(memory.liveBlocks(), 0u) << budget;
+        const auto& messages = KsCHostMessageServer::instance().messages();
+        ASSERT_EQ(messages.size(), 1u) << budget;
+        EXPECT_EQ(messages[0].text, "Internal error. Error code: KsCItfControl 102. Contact "
+                                    "Zandor's technical support team.");
+    }
+    std::filesystem::current_path(previous);
+    KsCHostMessageServer::instance().clear();
+}
+
+} // namespace
