@@ -64,20 +64,40 @@ public:
 } // namespace
 
 KS_Dumpable::~KS_Dumpable() = default;
-ZnCXString KS_Dumpable::getDumpFileName() { return ""; }
-ZnCXString KS_Dumpable::getNameForDump() { return ""; }
-ZnCXString KS_Dumpable::getLinkNameForDump() { return ""; }
-ZnCXString KS_Dumpable::getColorForDump() { return ""; }
-void KS_Dumpable::dumpStart(KS_Dump* dump, const char* className) { dump->beginSection(className); }
-void KS_Dumpable::dumpFinish(KS_Dump* dump) { dump->endSection(); }
-void KS_Dumpable::dump(KS_Dump* dump) { dumpContents(dump, false); }
-KS_Dump* KS_Dumpable::dumpContents(KS_Dump*, bool) { return nullptr; }
+ZnCXString KS_Dumpable::getDumpFileName() {
+    return "";
+}
+ZnCXString KS_Dumpable::getNameForDump() {
+    return "";
+}
+ZnCXString KS_Dumpable::getLinkNameForDump() {
+    return "";
+}
+ZnCXString KS_Dumpable::getColorForDump() {
+    return "";
+}
+void KS_Dumpable::dumpStart(KS_Dump* dump, const char* className) {
+    dump->beginSection(className);
+}
+void KS_Dumpable::dumpFinish(KS_Dump* dump) {
+    dump->endSection();
+}
+void KS_Dumpable::dump(KS_Dump* dump) {
+    dumpContents(dump, false);
+}
+KS_Dump* KS_Dumpable::dumpContents(KS_Dump*, bool) {
+    return nullptr;
+}
 
 KS_HtmlColorServer::~KS_HtmlColorServer() = default;
 KS_Dump::~KS_Dump() = default;
 
-void KS_DumpHtml::setOutputDirectory(const ZnCXString& directory) { outputDirectory = directory; }
-ZnCXString KS_DumpHtml::getOutputDirectory() { return outputDirectory; }
+void KS_DumpHtml::setOutputDirectory(const ZnCXString& directory) {
+    outputDirectory = directory;
+}
+ZnCXString KS_DumpHtml::getOutputDirectory() {
+    return outputDirectory;
+}
 
 KS_HtmlColorServer* GLB_GetHtmlColorServer() {
     static PaletteColorServer server;
@@ -116,8 +136,7 @@ struct KS_DumpTree::Impl {
                "span.key{display:inline-block;min-width:16em;color:#555}</style>"
                "</head><body>\n";
         if (name != masterFile)
-            page += "<p><a href=\"" + escaped(masterFile) + "\">" + escaped(title) +
-                    "</a></p>\n";
+            page += "<p><a href=\"" + escaped(masterFile) + "\">" + escaped(title) + "</a></p>\n";
     }
 
     void close() {
@@ -140,8 +159,8 @@ struct KS_DumpTree::Impl {
             page += "<div class=\"section\">\n";
             ++depth;
         }
-        page += "<div><span class=\"key\">" + escaped(name.view()) + "</span> <span>" +
-                valueHtml + "</span></div>\n";
+        page += "<div><span class=\"key\">" + escaped(name.view()) + "</span> <span>" + valueHtml +
+                "</span></div>\n";
     }
 
     void link(const ZnCXString& name, KS_Dumpable* object) {
@@ -157,7 +176,9 @@ struct KS_DumpTree::Impl {
     }
 };
 
-KS_DumpTree::KS_DumpTree(KS_HtmlColorServer* colors) : impl_(new Impl()) { impl_->colors = colors; }
+KS_DumpTree::KS_DumpTree(KS_HtmlColorServer* colors) : impl_(new Impl()) {
+    impl_->colors = colors;
+}
 
 KS_DumpTree::~KS_DumpTree() {
     closeAllFiles();

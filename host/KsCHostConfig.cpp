@@ -98,8 +98,7 @@ bool KsCHostConfig::parse(std::string_view text, KsCHostConfig& config, std::str
     return true;
 }
 
-bool KsCHostConfig::load(const std::string& fileName, KsCHostConfig& config,
-                         std::string& error) {
+bool KsCHostConfig::load(const std::string& fileName, KsCHostConfig& config, std::string& error) {
     std::ifstream file(fileName, std::ios::binary);
     if (!file)
         return error = "cannot read the host configuration " + fileName, false;

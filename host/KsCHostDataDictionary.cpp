@@ -46,8 +46,12 @@ znddapi::DDHandle find(const char* path) {
 
 } // namespace
 
-const KsCHostConfig* KsCHostDataDictionary::current() { return installed; }
-void KsCHostDataDictionary::install(const KsCHostConfig* config) { installed = config; }
+const KsCHostConfig* KsCHostDataDictionary::current() {
+    return installed;
+}
+void KsCHostDataDictionary::install(const KsCHostConfig* config) {
+    installed = config;
+}
 
 namespace znddapi {
 
@@ -115,7 +119,9 @@ int ZNCDDTypedef::GetBaseType(int* code) const {
     return 0;
 }
 
-void DDAPIHeapFree(void* buffer) { std::free(buffer); }
+void DDAPIHeapFree(void* buffer) {
+    std::free(buffer);
+}
 
 } // namespace znddapi
 

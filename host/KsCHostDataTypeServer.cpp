@@ -31,8 +31,8 @@ void KsCHostDataTypeServer::addAlias(const std::string& alias, KsCHostDataType* 
     byName_.emplace(alias, type);
 }
 
-KS_DataType* KsCHostDataTypeServer::findTypeByName(const ZnCXString& name,
-                                                   const KS_DimensionDescr&, KsCSrcRef*, bool) {
+KS_DataType* KsCHostDataTypeServer::findTypeByName(const ZnCXString& name, const KS_DimensionDescr&,
+                                                   KsCSrcRef*, bool) {
     auto found = byName_.find(name.str());
     return found == byName_.end() ? nullptr : found->second;
 }

@@ -9,7 +9,9 @@ std::FILE* scannerOutput = stdout;
 
 KsCMessageServer::~KsCMessageServer() = default;
 
-KsCMessageServer* KsCMessageServer::getMessageServer() { return &KsCHostMessageServer::instance(); }
+KsCMessageServer* KsCMessageServer::getMessageServer() {
+    return &KsCHostMessageServer::instance();
+}
 
 KsCHostMessageServer& KsCHostMessageServer::instance() {
     static KsCHostMessageServer server;
@@ -22,11 +24,19 @@ bool KsCHostMessageServer::putMessage(tagERR_error_severity_etp severity, int nu
     return true;
 }
 
-void KsCHostMessageServer::setShowInternalInfo(bool on) { showInternalInfo = on; }
-void KsCHostMessageServer::setScannerOutput(std::FILE* stream) { scannerOutput = stream; }
+void KsCHostMessageServer::setShowInternalInfo(bool on) {
+    showInternalInfo = on;
+}
+void KsCHostMessageServer::setScannerOutput(std::FILE* stream) {
+    scannerOutput = stream;
+}
 
-bool ShowInternalInfo() { return showInternalInfo; }
-std::FILE* KS_GetScannerOutput() { return scannerOutput; }
+bool ShowInternalInfo() {
+    return showInternalInfo;
+}
+std::FILE* KS_GetScannerOutput() {
+    return scannerOutput;
+}
 
 const char* severityWord(int severity) {
     switch (severity) {

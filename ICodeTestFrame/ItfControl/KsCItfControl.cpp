@@ -113,8 +113,8 @@ bool KsCItfControl::initServers(KS_ICodeFactoryContainer* container,
 }
 
 bool KsCItfControl::exit() {
-    return finish(input_) && finish(factory_) && finish(messages_) &&
-           finish(typeNameRegistry_) && finish(srcRefServer_);
+    return finish(input_) && finish(factory_) && finish(messages_) && finish(typeNameRegistry_) &&
+           finish(srcRefServer_);
 }
 
 bool KsCItfControl::run() {
@@ -168,7 +168,9 @@ bool KsCItfControl::runTests() {
     return true;
 }
 
-bool KsCItfControl::dumpWanted() const { return options_ && options_->getICodeTestDumpTree(); }
+bool KsCItfControl::dumpWanted() const {
+    return options_ && options_->getICodeTestDumpTree();
+}
 
 void KsCItfControl::dumpApplication(KsCItfApplication* application) {
     KS_DumpTree dump(GLB_GetHtmlColorServer());

@@ -24,5 +24,9 @@ KsCItfControlIF* KsCIvToCvTestFactory::getICodeTest() {
     return control_;
 }
 
-void* KsCIvToCvTestFactory::operator new(decltype(sizeof 0) size) { return itf::allocate(size); }
-void KsCIvToCvTestFactory::operator delete(void* block) noexcept { itf::release(block); }
+void* KsCIvToCvTestFactory::operator new(decltype(sizeof 0) size) {
+    return itf::allocate(size);
+}
+void KsCIvToCvTestFactory::operator delete(void* block) noexcept {
+    itf::release(block);
+}

@@ -2,14 +2,17 @@
 
 #include "ItfSrcRef/KsCItfSrcRef.h"
 
-
 namespace {
 constexpr std::size_t kArenaBlockSize = 1024 * 1024;
 }
 
-KsCItfFactory::~KsCItfFactory() { exit(); }
+KsCItfFactory::~KsCItfFactory() {
+    exit();
+}
 
-bool KsCItfFactory::init() { return true; }
+bool KsCItfFactory::init() {
+    return true;
+}
 
 bool KsCItfFactory::exit() {
     for (KS_Dumpable* object : dumpables_)
@@ -39,6 +42,10 @@ void KsCItfFactory::startBlock(std::size_t size) {
     limit_ = reinterpret_cast<char*>(block) + blockSize;
 }
 
-KsCItfSrcRef* KsCItfFactory::createSrcRef() { return make<KsCItfSrcRef>(&pool_); }
+KsCItfSrcRef* KsCItfFactory::createSrcRef() {
+    return make<KsCItfSrcRef>(&pool_);
+}
 
-KsCItfString* KsCItfFactory::createString() { return make<KsCItfString>(); }
+KsCItfString* KsCItfFactory::createString() {
+    return make<KsCItfString>();
+}

@@ -31,7 +31,15 @@ public:
     KsCItfSrcRef* createSrcRef();
     KsCItfString* createString();
 
+    // The pooled copy of a text, alive until exit.
+    const char* intern(std::string_view text) { return pool_.intern(text); }
+
+    std::size_t objectCount() const { return dumpables_.size() + strings_.size(); }
+    // Nodes and source positions in creation order.
+    const KsCItfOwnerList<KS_Dumpable>& dumpables() const { return dumpables_; }
+
     // One creator per concrete node class: createApplication, createAdditiveExpression_AddOp...
+    // clang-format off
 #define ITF_CREATE_PRODUCTION(NT, Production, Children)                                        \
     KsCItf##NT##_##Production* create##NT##_##Production() {                                   \
         return make<KsCItf##NT##_##Production>();                                              \
@@ -43,13 +51,7 @@ public:
 #undef ITF_CREATE_PRODUCTION
 #undef ITF_CREATE_SINGLE
 #undef ITF_CREATE_ABSTRACT
-
-    // The pooled copy of a text, alive until exit.
-    const char* intern(std::string_view text) { return pool_.intern(text); }
-
-    std::size_t objectCount() const { return dumpables_.size() + strings_.size(); }
-    // Nodes and source positions in creation order.
-    const KsCItfOwnerList<KS_Dumpable>& dumpables() const { return dumpables_; }
+    // clang-format on
 
 protected:
     template <class T, class... Args> T* make(Args&&... args) {

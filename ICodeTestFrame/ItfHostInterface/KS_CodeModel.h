@@ -9,10 +9,10 @@ class KS_DataTypeServer;
 
 // Services whose operations the module calls through later components; each is a host object
 // the container hands out once.
-#define KS_HOST_SERVICE(Name)                                                                  \
-    class KS_HOST_API Name {                                                                   \
-    public:                                                                                    \
-        virtual ~Name();                                                                       \
+#define KS_HOST_SERVICE(Name)                                                                      \
+    class KS_HOST_API Name {                                                                       \
+    public:                                                                                        \
+        virtual ~Name();                                                                           \
     };
 KS_HOST_SERVICE(KS_VariableSymbolServer)
 KS_HOST_SERVICE(KS_FunctionSymbolServer)

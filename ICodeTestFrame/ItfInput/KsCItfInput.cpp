@@ -30,9 +30,13 @@ bool readWhole(const std::string& name, std::string& content, const char*& probl
 
 } // namespace
 
-bool KsCItfInput::init() { return true; }
+bool KsCItfInput::init() {
+    return true;
+}
 
-bool KsCItfInput::exit() { return true; }
+bool KsCItfInput::exit() {
+    return true;
+}
 
 bool KsCItfInput::collectInputFiles(KsCItfInputFileList& files) {
     std::error_code ec;
@@ -59,9 +63,10 @@ bool KsCItfInput::collectInputFiles(KsCItfInputFileList& files) {
         files.push_back(nullptr);
         files.back() = new KsCItfInputFile(name, baseName, ZnCXString(std::move(content)));
     }
-    std::stable_sort(files.begin(), files.end(), [](const KsCItfInputFile* a, const KsCItfInputFile* b) {
-        return compareInputFiles(a, b) < 0;
-    });
+    std::stable_sort(files.begin(), files.end(),
+                     [](const KsCItfInputFile* a, const KsCItfInputFile* b) {
+                         return compareInputFiles(a, b) < 0;
+                     });
     return true;
 }
 

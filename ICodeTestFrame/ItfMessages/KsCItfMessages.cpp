@@ -12,7 +12,9 @@ namespace {
 
 constexpr const char* kFrameHeading = "ICode Test Frame Messages";
 
-const char* orNull(const char* text) { return text ? text : "_NULL_"; }
+const char* orNull(const char* text) {
+    return text ? text : "_NULL_";
+}
 
 // snprintf bounds the text to the shared buffer: a longer message is cut, never overrun.
 void putFormatted(tagERR_error_severity_etp severity, int number, const char* heading,
@@ -57,7 +59,9 @@ bool KsCItfMessages::init(KsCItfSrcRefServer* srcRefServer, KsCItfFactory* facto
     return true;
 }
 
-bool KsCItfMessages::exit() { return true; }
+bool KsCItfMessages::exit() {
+    return true;
+}
 
 void KsCItfMessages::reportError(const KsCItfSrcRef* position, const ZnCXString& text) {
     if (position && srcRefServer_)

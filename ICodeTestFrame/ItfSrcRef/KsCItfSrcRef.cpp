@@ -6,7 +6,9 @@ void KsCItfSrcRef::setFileName(const ZnCXString& fileName) {
     fileName_ = pool_->intern(fileName.view());
 }
 
-void KsCItfSrcRef::setToken(const ZnCXString& token) { token_ = pool_->intern(token.view()); }
+void KsCItfSrcRef::setToken(const ZnCXString& token) {
+    token_ = pool_->intern(token.view());
+}
 
 KS_Dump* KsCItfSrcRef::dumpContents(KS_Dump* dump, bool) {
     dumpStart(dump, "KsCItfSrcRef");

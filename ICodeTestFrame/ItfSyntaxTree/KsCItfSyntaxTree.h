@@ -16,6 +16,7 @@ class KsCItfFactory;
 // A node's list child: elements in source order, storage through the module's allocation pair.
 template <class T> using KsCItfList = std::vector<T, KsCItfAllocator<T>>;
 
+// clang-format off
 #define ITF_FORWARD_PRODUCTION(NT, Production, Children) class KsCItf##NT##_##Production;
 #define ITF_FORWARD_SINGLE(Name, Downcast, Children) class KsCItf##Name;
 #define ITF_FORWARD_ABSTRACT(Name, Downcast, Children)                                        \
@@ -130,3 +131,4 @@ ITF_NONTERMINALS(ITF_DEFINE_SINGLE, ITF_DEFINE_ABSTRACT)
 #undef ITF_TEXT
 #undef ITF_TEXT_LIST
 #undef ITF_NUMBER
+// clang-format on

@@ -21,6 +21,7 @@ KS_Dump* KsCItfNonTerminal::dumpContents(KS_Dump* dump, bool) {
     return nullptr;
 }
 
+// clang-format off
 #define ITF_NODE(Role, Class) dump->addProperty(#Role, Role, true);
 #define ITF_OPTIONAL(Role, Class)                                                              \
     if (Role)                                                                                  \
@@ -58,3 +59,4 @@ KS_Dump* KsCItfNonTerminal::dumpContents(KS_Dump* dump, bool) {
     ITF_PRODUCTIONS_##Name(ITF_DUMP_PRODUCTION)
 
 ITF_NONTERMINALS(ITF_DUMP_SINGLE, ITF_DUMP_ABSTRACT)
+// clang-format on

@@ -87,7 +87,9 @@ TEST_F(KsCItfRunTest, TypedefLoadingFailureStopsTheRunBeforeParsing) {
                                                  "Typedef objects from data dictionary"}));
 }
 
-TEST_F(KsCItfRunTest, AnEmptyFolderIsASuccessfulRun) { EXPECT_TRUE(run()); }
+TEST_F(KsCItfRunTest, AnEmptyFolderIsASuccessfulRun) {
+    EXPECT_TRUE(run());
+}
 
 TEST_F(KsCItfRunTest, TreesOfSeveralRunsAreReleasedByExit) {
     dir.write("a.itf", "int f() { x = (1 + 2) * y; }\n");

@@ -37,8 +37,8 @@ TEST_F(KsCItfInputTest, TakesTheTestFilesInTheirOrder) {
     dir.write("a_itf", "second a");
     std::filesystem::create_directory(dir.path() / "old.itf");
     std::filesystem::create_symlink("missing.itf", dir.path() / "dangling.itf");
-    EXPECT_EQ(collect(), (std::vector<std::string>{"znfxp_mul=Z", "=I", "=X", "a=A",
-                                                   "a=second a", "b=B", "empty="}));
+    EXPECT_EQ(collect(), (std::vector<std::string>{"znfxp_mul=Z", "=I", "=X", "a=A", "a=second a",
+                                                   "b=B", "empty="}));
     EXPECT_TRUE(messages().empty());
 }
 
@@ -51,7 +51,9 @@ TEST_F(KsCItfInputTest, ReadsTheWholeTextByteForByte) {
     EXPECT_EQ(names[0], "big=" + text);
 }
 
-TEST_F(KsCItfInputTest, EmptyDirectoryGivesNoFiles) { EXPECT_TRUE(collect().empty()); }
+TEST_F(KsCItfInputTest, EmptyDirectoryGivesNoFiles) {
+    EXPECT_TRUE(collect().empty());
+}
 
 TEST_F(KsCItfInputTest, UnreadableFileIsReported) {
     if (::geteuid() == 0)

@@ -1,5 +1,5 @@
-#include "ItfFactory/KsCItfFactory.h"
 #include "ItfMessages/KsCItfMessages.h"
+#include "ItfFactory/KsCItfFactory.h"
 #include "ItfSrcRef/KsCItfSrcRef.h"
 #include "ItfSrcRef/KsCItfSrcRefServer.h"
 #include "ItfTestSupport.h"

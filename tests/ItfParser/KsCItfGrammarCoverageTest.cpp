@@ -37,11 +37,11 @@ TEST_F(KsCItfGrammarCoverageTest, EveryProductionIsBuiltBySomeTestFile) {
     for (KS_Dumpable* object : factory.dumpables())
         built.insert(classNameOf(object));
     std::set<std::string> missing;
-#define ITF_EXPECT_PRODUCTION(NT, Production, Children)                                        \
-    if (!built.count("KsCItf" #NT "_" #Production))                                            \
+#define ITF_EXPECT_PRODUCTION(NT, Production, Children)                                            \
+    if (!built.count("KsCItf" #NT "_" #Production))                                                \
         missing.insert("KsCItf" #NT "_" #Production);
-#define ITF_EXPECT_SINGLE(Name, Downcast, Children)                                            \
-    if (!built.count("KsCItf" #Name))                                                          \
+#define ITF_EXPECT_SINGLE(Name, Downcast, Children)                                                \
+    if (!built.count("KsCItf" #Name))                                                              \
         missing.insert("KsCItf" #Name);
 #define ITF_EXPECT_ABSTRACT(Name, Downcast, Children) ITF_PRODUCTIONS_##Name(ITF_EXPECT_PRODUCTION)
     ITF_NONTERMINALS(ITF_EXPECT_SINGLE, ITF_EXPECT_ABSTRACT)

@@ -24,8 +24,9 @@ std::string corpus() {
 
 TEST_F(KsCItfParserRobustnessTest, DamagedFilesEndInTheTreeOrInOneSyntaxError) {
     const std::string original = corpus();
-    const std::string pieces[] = {"(", ")", "{", "}", ";", ",", "ADD(", "SMB_INFO(", "\"",
-                                  "'", "/*", "\n", "\t", "0x", "-", "IC_INFO(x = 1)", "\xff"};
+    const std::string pieces[] = {"(",   ")", "{",  "}",  ";",  ",",  "ADD(", "SMB_INFO(",
+                                  "\"",  "'", "/*", "\n", "\t", "0x", "-",    "IC_INFO(x = 1)",
+                                  "\xff"};
     std::mt19937 random(20261206);
     int accepted = 0;
     for (int round = 0; round < 300; ++round) {

@@ -52,7 +52,8 @@ TEST_F(KsCItfParserTest, SyntaxErrorsReportOneMessageAtTheOffendingToken) {
 }
 
 TEST_F(KsCItfParserTest, NestingBeyondTheStackDepthIsAStackOverflow) {
-    std::string deep = "int f() { x = " + std::string(200, '(') + "1" + std::string(200, ')') + "; }";
+    std::string deep =
+        "int f() { x = " + std::string(200, '(') + "1" + std::string(200, ')') + "; }";
     EXPECT_EQ(parse(deep), nullptr);
     ASSERT_EQ(messages().size(), 1u);
     EXPECT_NE(messages()[0].text.find(": Parser stack overflow"), std::string::npos)
@@ -92,7 +93,8 @@ TEST_F(KsCItfParserTest, ListsKeepSourceOrder) {
                             ->ExpressionStatement->asExpressionStatement_Expression()
                             ->Expression->asExpression_AssignmentExpression();
         ASSERT_NE(primary, nullptr);
-        names.push_back(nodes<KsCItfPrimaryExpression_IDENTIFIER>()[names.size()]->Identifier.str());
+        names.push_back(
+            nodes<KsCItfPrimaryExpression_IDENTIFIER>()[names.size()]->Identifier.str());
     }
     EXPECT_EQ(names, (std::vector<std::string>{"a", "b", "c"}));
     for (KsCItfExternalDeclaration* declaration : root->ExternalDeclaration)
@@ -121,8 +123,7 @@ TEST_F(KsCItfParserTest, QualifiedOperationsCarryTheirPropertiesAsOperationInfo)
 }
 
 TEST_F(KsCItfParserTest, QualifiedUnaryAndAssignmentOperatorsBecomePlainOperators) {
-    ASSERT_NE(parse("int f() { x ASSIGN(k = 1) y; z MUL_ASSIGN(k = 2) NOT(k = 3) w; }"),
-              nullptr);
+    ASSERT_NE(parse("int f() { x ASSIGN(k = 1) y; z MUL_ASSIGN(k = 2) NOT(k = 3) w; }"), nullptr);
     auto assignments = nodes<KsCItfAssignmentExpression_AssignOp_Qualified>();
     ASSERT_EQ(assignments.size(), 2u);
     EXPECT_NE(assignments[0]->AssignmentOperator->asAssignmentOperator_Assign(), nullptr);

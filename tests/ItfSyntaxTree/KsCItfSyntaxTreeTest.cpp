@@ -23,10 +23,10 @@ int answeringBaseDowncasts(KsCItfNonTerminal* node, KsCItfNonTerminal*& answer) 
     int count = 0;
 #define ITF_ASK_0(Name)
 #define ITF_ASK_2(Name)
-#define ITF_ASK_1(Name)                                                                        \
-    if (KsCItfNonTerminal* a = node->as##Name()) {                                             \
-        ++count;                                                                               \
-        answer = a;                                                                            \
+#define ITF_ASK_1(Name)                                                                            \
+    if (KsCItfNonTerminal* a = node->as##Name()) {                                                 \
+        ++count;                                                                                   \
+        answer = a;                                                                                \
     }
 #define ITF_ASK(Name, Downcast, Children) ITF_ASK_##Downcast(Name)
     ITF_NONTERMINALS(ITF_ASK, ITF_ASK)
@@ -34,11 +34,12 @@ int answeringBaseDowncasts(KsCItfNonTerminal* node, KsCItfNonTerminal*& answer) 
 }
 
 // How many production downcasts of its non-terminal answer for a node.
-#define ITF_COUNT_SIBLING(NT, Production, Children) count += node->as##NT##_##Production() != nullptr;
-#define ITF_SIBLING_COUNTER(Name, Downcast, Children)                                          \
-    [[maybe_unused]] int answeringProductionDowncasts(KsCItf##Name* node) {                    \
-        int count = 0;                                                                         \
-        ITF_PRODUCTIONS_##Name(ITF_COUNT_SIBLING) return count;                                \
+#define ITF_COUNT_SIBLING(NT, Production, Children)                                                \
+    count += node->as##NT##_##Production() != nullptr;
+#define ITF_SIBLING_COUNTER(Name, Downcast, Children)                                              \
+    [[maybe_unused]] int answeringProductionDowncasts(KsCItf##Name* node) {                        \
+        int count = 0;                                                                             \
+        ITF_PRODUCTIONS_##Name(ITF_COUNT_SIBLING) return count;                                    \
     }
 ITF_NONTERMINALS(ITF_COUNT_NOTHING, ITF_SIBLING_COUNTER)
 
@@ -64,19 +65,19 @@ void expectOwnDowncasts(KsCItfNonTerminal* node, KsCItfNonTerminal* ownAnswer,
 
 TEST_F(KsCItfSyntaxTreeNodeTest, EveryNodeAnswersOnlyItsOwnDowncasts) {
     int checked = 0;
-#define ITF_CHECK_PRODUCTION(NT, Production, Children)                                         \
-    {                                                                                          \
-        auto* node = factory.create##NT##_##Production();                                      \
-        expectOwnDowncasts(node, node->as##NT##_##Production(),                                \
-                           answeringProductionDowncasts(node), #NT "_" #Production);           \
-        ++checked;                                                                             \
+#define ITF_CHECK_PRODUCTION(NT, Production, Children)                                             \
+    {                                                                                              \
+        auto* node = factory.create##NT##_##Production();                                          \
+        expectOwnDowncasts(node, node->as##NT##_##Production(),                                    \
+                           answeringProductionDowncasts(node), #NT "_" #Production);               \
+        ++checked;                                                                                 \
     }
 #define ITF_CHECK_ABSTRACT(Name, Downcast, Children) ITF_PRODUCTIONS_##Name(ITF_CHECK_PRODUCTION)
-#define ITF_CHECK_SINGLE(Name, Downcast, Children)                                             \
-    {                                                                                          \
-        KsCItfNonTerminal* answer = nullptr;                                                   \
-        EXPECT_EQ(answeringBaseDowncasts(factory.create##Name(), answer), Downcast) << #Name;  \
-        ++checked;                                                                             \
+#define ITF_CHECK_SINGLE(Name, Downcast, Children)                                                 \
+    {                                                                                              \
+        KsCItfNonTerminal* answer = nullptr;                                                       \
+        EXPECT_EQ(answeringBaseDowncasts(factory.create##Name(), answer), Downcast) << #Name;      \
+        ++checked;                                                                                 \
     }
     ITF_NONTERMINALS(ITF_CHECK_SINGLE, ITF_CHECK_ABSTRACT)
     EXPECT_EQ(checked, 262);

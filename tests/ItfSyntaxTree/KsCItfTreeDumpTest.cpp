@@ -54,8 +54,11 @@ TEST_F(KsCItfTreeDumpTest, EveryNodeAndPositionGetsALinkedPage) {
 
     std::string loop = pageWith("<h1>KsCItfIterationStatement_WHILE_Qualified</h1>");
     ASSERT_FALSE(loop.empty());
-    EXPECT_NE(loop.find("<span class=\"key\">AdditionalInfo_LoopInfo</span> <span>---</span>"), std::string::npos);
-    EXPECT_NE(loop.find("<span class=\"key\">AdditionalInfo_IcInfo</span> <span><a href=\"KsCItfAdditionalInfo_IcInfo_"), std::string::npos);
+    EXPECT_NE(loop.find("<span class=\"key\">AdditionalInfo_LoopInfo</span> <span>---</span>"),
+              std::string::npos);
+    EXPECT_NE(loop.find("<span class=\"key\">AdditionalInfo_IcInfo</span> <span><a "
+                        "href=\"KsCItfAdditionalInfo_IcInfo_"),
+              std::string::npos);
     EXPECT_NE(loop.find("Debug Idx"), std::string::npos);
     EXPECT_NE(loop.find("ItfApplication.html"), std::string::npos);
 
@@ -67,7 +70,8 @@ TEST_F(KsCItfTreeDumpTest, EveryNodeAndPositionGetsALinkedPage) {
     EXPECT_NE(position.find("<span class=\"key\">Module</span> <span>t</span>"), std::string::npos);
 
     std::string unitPage = pageWith("<h1>KsCItfTranslationUnit</h1>");
-    EXPECT_NE(unitPage.find("<span class=\"key\">ModuleName</span> <span></span>"), std::string::npos);
+    EXPECT_NE(unitPage.find("<span class=\"key\">ModuleName</span> <span></span>"),
+              std::string::npos);
 }
 
 TEST_F(KsCItfTreeDumpTest, QualifiedOperatorsWriteTheirPropertiesAndEmptyListsNothing) {
@@ -80,8 +84,10 @@ TEST_F(KsCItfTreeDumpTest, QualifiedOperatorsWriteTheirPropertiesAndEmptyListsNo
     holder->TranslationUnit.push_back(unit);
     dump(qualified);
     std::string text = pageWith("<h1>KsCItfQualifiedUnaryOperator_Minus</h1>");
-    EXPECT_NE(text.find("<div class=\"class\">KsCItfQualifiedUnaryOperator</div>"), std::string::npos);
-    EXPECT_NE(text.find("<span class=\"key\">AdditionalInfoPropertyValueList</span>"), std::string::npos);
+    EXPECT_NE(text.find("<div class=\"class\">KsCItfQualifiedUnaryOperator</div>"),
+              std::string::npos);
+    EXPECT_NE(text.find("<span class=\"key\">AdditionalInfoPropertyValueList</span>"),
+              std::string::npos);
     EXPECT_EQ(text.find("SrcRef"), std::string::npos);
     dump(list);
     std::string specifiers = pageWith("<h1>KsCItfDeclarationSpecifiers</h1>");

@@ -1,6 +1,6 @@
+#include "KsCHostConfig.h"
 #include "ItfHostInterface/KS_DataDictionary.h"
 #include "KsCHostCodeModel.h"
-#include "KsCHostConfig.h"
 
 #include <gtest/gtest.h>
 
@@ -46,15 +46,14 @@ TEST(KsCHostConfigTest, RefusesDictionariesNestedTooDeep) {
 TEST(KsCHostConfigTest, EmbeddedDefaultHoldsTheFixedWidthTypedefs) {
     KsCHostConfig config;
     std::string error;
-    ASSERT_TRUE(KsCHostConfig::parse(KsCHostConfig::embeddedDefaultText(), config, error))
-        << error;
+    ASSERT_TRUE(KsCHostConfig::parse(KsCHostConfig::embeddedDefaultText(), config, error)) << error;
     std::vector<std::string> typedefs;
     for (const KsCHostDDObject& o : config.ddObjects)
         if (o.kind == KsCHostDDObject::Kind::Typedef)
             typedefs.push_back(o.name);
-    EXPECT_EQ(typedefs, (std::vector<std::string>{"sint8", "uint8", "sint16", "uint16", "sint32",
-                                                  "uint32", "sint64", "uint64", "float32",
-                                                  "float64", "boolean"}));
+    EXPECT_EQ(typedefs,
+              (std::vector<std::string>{"sint8", "uint8", "sint16", "uint16", "sint32", "uint32",
+                                        "sint64", "uint64", "float32", "float64", "boolean"}));
 }
 
 TEST(KsCHostConfigTest, DataDictionaryApiWalksTheTree) {

@@ -7,7 +7,9 @@
 
 namespace {
 
-std::string itfRun(const std::string& args) { return std::string(ITF_RUN_PATH) + " " + args; }
+std::string itfRun(const std::string& args) {
+    return std::string(ITF_RUN_PATH) + " " + args;
+}
 
 TEST(ItfRunTest, DisabledRunAnswersTrueWhateverTheFolderHolds) {
     ItfTempDir dir;
@@ -89,8 +91,8 @@ TEST(ItfRunTest, DumpTreeWritesBrowsablePages) {
     ItfTempDir dir;
     ItfTempDir pages;
     dir.write("a.itf", "int f() { x = 1; }\n");
-    auto r = runCommand(itfRun("--dump-tree " + (pages.path() / "out").string() + " " +
-                               dir.path().string()));
+    auto r = runCommand(
+        itfRun("--dump-tree " + (pages.path() / "out").string() + " " + dir.path().string()));
     EXPECT_EQ(r.status, 0);
     EXPECT_TRUE(std::filesystem::exists(pages.path() / "out" / "ItfApplication.html"));
     int count = 0;

@@ -1,13 +1,13 @@
 // itf-run: drives the test frame module the way the code generator does, over the test files
 // of one directory, and shows what it reported.
 #include "ItfControl/KsCItfControlIF.h"
+#include "ItfHostInterface/KS_Dump.h"
 #include "ItfRunReport.h"
 #include "KsCHostCodeModel.h"
 #include "KsCHostConfig.h"
 #include "KsCHostMemController.h"
 #include "KsCHostMessageServer.h"
 #include "KsCHostOptions.h"
-#include "ItfHostInterface/KS_Dump.h"
 
 #include <CLI/CLI.hpp>
 
