@@ -27,8 +27,6 @@ public:
         column_ = column;
         token_ = pooledToken;
     }
-    const char* fileNameText() const { return fileName_; }
-    const char* tokenText() const { return token_; }
 
     KS_Dump* dumpContents(KS_Dump* dump, bool flag) override;
 

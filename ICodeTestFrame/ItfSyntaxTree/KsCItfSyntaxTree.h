@@ -63,14 +63,12 @@ public:
     ITF_NONTERMINALS(ITF_DECLARE_BASE_DOWNCAST, ITF_DECLARE_BASE_DOWNCAST)
 #undef ITF_DECLARE_BASE_DOWNCAST
 
-    // The number of nodes constructed since the module was loaded; never reset.
-    static int nodesConstructed() { return nextDebugIndex; }
-
 protected:
     KsCItfNonTerminal() : debugIndex_(nextDebugIndex++) {}
     void dumpCommon(KS_Dump* dump);
 
 private:
+    // Numbers every node constructed since the module was loaded; never reset.
     static int nextDebugIndex;
 
     KsCItfNonTerminal* parent_ = nullptr;
