@@ -29,7 +29,8 @@ bool KsCItfFactory::exit() {
         blocks_ = next;
     }
     cursor_ = limit_ = nullptr;
-    pool_.clear();
+    // Swapping with an empty set also returns the bucket array.
+    decltype(texts_)().swap(texts_);
     return true;
 }
 
@@ -42,8 +43,20 @@ void KsCItfFactory::startBlock(std::size_t size) {
     limit_ = reinterpret_cast<char*>(block) + blockSize;
 }
 
+const char* KsCItfFactory::intern(std::string_view text) {
+    auto found = texts_.find(text);
+    if (found != texts_.end())
+        return found->data();
+    auto* copy = static_cast<char*>(
+        allocateInArena((text.size() + kArenaAlignment) & ~(kArenaAlignment - 1)));
+    text.copy(copy, text.size());
+    copy[text.size()] = '\0';
+    texts_.insert(std::string_view(copy, text.size()));
+    return copy;
+}
+
 KsCItfSrcRef* KsCItfFactory::createSrcRef() {
-    return make<KsCItfSrcRef>(&pool_);
+    return make<KsCItfSrcRef>(this);
 }
 
 KsCItfString* KsCItfFactory::createString() {

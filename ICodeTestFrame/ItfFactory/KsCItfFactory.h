@@ -6,13 +6,14 @@
 #include "ItfControl/KsCItfMemory.h"
 #include "ItfFactory/KsCItfOwnerList.h"
 #include "ItfFactory/KsCItfString.h"
-#include "ItfFactory/KsCItfTextPool.h"
 #include "ItfHostInterface/KS_Dump.h"
 #include "ItfSyntaxTree/KsCItfSyntaxTree.h"
 
 #include <cstddef>
 #include <new>
+#include <string_view>
 #include <type_traits>
+#include <unordered_set>
 #include <utility>
 #include <vector>
 
@@ -31,8 +32,9 @@ public:
     KsCItfSrcRef* createSrcRef();
     KsCItfString* createString();
 
-    // The pooled copy of a text, alive until exit.
-    const char* intern(std::string_view text) { return pool_.intern(text); }
+    // The pooled copy of a text, NUL-terminated, alive until exit: equal texts share one copy,
+    // so positions and token texts hold a pointer instead of a string of their own.
+    const char* intern(std::string_view text);
 
     std::size_t objectCount() const { return dumpables_.size() + strings_.size(); }
     // Nodes and source positions in creation order.
@@ -92,5 +94,7 @@ private:
     char* limit_ = nullptr;
     KsCItfOwnerList<KS_Dumpable> dumpables_;
     KsCItfOwnerList<KsCItfString> strings_;
-    KsCItfTextPool pool_;
+    std::unordered_set<std::string_view, std::hash<std::string_view>, std::equal_to<>,
+                       KsCItfAllocator<std::string_view>>
+        texts_;
 };

@@ -1,13 +1,13 @@
 #include "ItfSrcRef/KsCItfSrcRef.h"
 
-#include "ItfFactory/KsCItfTextPool.h"
+#include "ItfFactory/KsCItfFactory.h"
 
 void KsCItfSrcRef::setFileName(const ZnCXString& fileName) {
-    fileName_ = pool_->intern(fileName.view());
+    fileName_ = factory_->intern(fileName.view());
 }
 
 void KsCItfSrcRef::setToken(const ZnCXString& token) {
-    token_ = pool_->intern(token.view());
+    token_ = factory_->intern(token.view());
 }
 
 KS_Dump* KsCItfSrcRef::dumpContents(KS_Dump* dump, bool) {

@@ -4,12 +4,12 @@
 #include "ItfHostInterface/KS_Dump.h"
 #include "ItfHostInterface/ZnCXString.h"
 
-class KsCItfTextPool;
+class KsCItfFactory;
 
 class KsCItfSrcRef : public KS_Dumpable {
 public:
-    // Texts are kept in the node factory's pool, which outlives every position it made.
-    explicit KsCItfSrcRef(KsCItfTextPool* pool) : pool_(pool) {}
+    // Texts are pooled by the node factory, which outlives every position it made.
+    explicit KsCItfSrcRef(KsCItfFactory* factory) : factory_(factory) {}
 
     void setFileName(const ZnCXString& fileName);
     void setLine(int line) { line_ = line; }
@@ -31,7 +31,7 @@ public:
     KS_Dump* dumpContents(KS_Dump* dump, bool flag) override;
 
 private:
-    KsCItfTextPool* pool_;
+    KsCItfFactory* factory_;
     const char* fileName_ = "";
     int line_ = 0;
     int column_ = 0;

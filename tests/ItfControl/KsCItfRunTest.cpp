@@ -22,6 +22,19 @@ protected:
         return result;
     }
 
+    // A configuration whose "/Pool/Typedefs" holds the given typedef objects.
+    static KsCHostConfig typedefs(const std::string& objects) {
+        KsCHostConfig config;
+        std::string error;
+        EXPECT_TRUE(KsCHostConfig::parse(
+            R"({"dataDictionary": [{"name": "Pool", "children": [{"name": "Typedefs", )"
+            R"("kind": "typedefGroup", "children": [)" +
+                objects + "]}]}]}",
+            config, error))
+            << error;
+        return config;
+    }
+
     std::filesystem::path previous = std::filesystem::current_path();
     ItfTempDir dir;
     KsCHostOptions options;
@@ -59,16 +72,10 @@ TEST_F(KsCItfRunTest, EachFileStartsAtColumnZero) {
 
 TEST_F(KsCItfRunTest, DataDictionaryTypedefsAreTypeNames) {
     dir.write("a.itf", "sint16 x;\n");
-    KsCHostConfig config;
-    std::string error;
-    ASSERT_TRUE(KsCHostConfig::parse(R"({"dataDictionary": [{"name": "Pool", "children": [
-        {"name": "Typedefs", "kind": "typedefGroup", "children": [
-            {"name": "other", "kind": "typedef", "baseType": 1, "type": "int8"},
-            {"name": "sint16", "kind": "typedef", "baseType": 15}]}]}]})",
-                                     config, error))
-        << error;
     // Unregistered in this dictionary: sint16 is a plain identifier and the file does not parse.
-    EXPECT_FALSE(run(config));
+    EXPECT_FALSE(
+        run(typedefs(R"({"name": "other", "kind": "typedef", "baseType": 1, "type": "int8"},
+        {"name": "sint16", "kind": "typedef", "baseType": 15})")));
     ASSERT_EQ(messages().size(), 1u);
     EXPECT_NE(messages()[0].text.find("Syntax error in file a, line 1, column 8"),
               std::string::npos);
@@ -76,13 +83,7 @@ TEST_F(KsCItfRunTest, DataDictionaryTypedefsAreTypeNames) {
 
 TEST_F(KsCItfRunTest, TypedefLoadingFailureStopsTheRunBeforeParsing) {
     dir.write("a.itf", "this does not parse");
-    KsCHostConfig config;
-    std::string error;
-    ASSERT_TRUE(KsCHostConfig::parse(R"({"dataDictionary": [{"name": "Pool", "children": [
-        {"name": "Typedefs", "kind": "typedefGroup", "children": [
-            {"name": "unknown", "kind": "typedef", "baseType": 1}]}]}]})",
-                                     config, error));
-    EXPECT_FALSE(run(config));
+    EXPECT_FALSE(run(typedefs(R"({"name": "unknown", "kind": "typedef", "baseType": 1})")));
     EXPECT_EQ(texts(), (std::vector<std::string>{"ICode test frame error: Error when loading "
                                                  "Typedef objects from data dictionary"}));
 }
