@@ -2,9 +2,8 @@
 // generated suite of many files with thousands of lines each.
 #include "ItfFactory/KsCItfFactory.h"
 #include "ItfMessages/KsCItfMessages.h"
-#include "ItfParser/KsCItfParser.h"
+#include "ItfParser/KsCItfParseSession.h"
 #include "ItfScanner/KsCItfScanner.h"
-#include "ItfSrcRef/KsCItfParseInfo.h"
 #include "ItfSuiteGenerator.h"
 #include "ItfTypeNameRegistry/KsCItfTypeNameRegistry.h"
 #include "KsCHostMemController.h"
@@ -15,6 +14,7 @@
 #include <cstdio>
 #include <filesystem>
 #include <fstream>
+#include <optional>
 #include <string_view>
 #include <sys/resource.h>
 
@@ -25,7 +25,7 @@ struct FrontEnd {
     KsCItfFactory factory;
     KsCItfMessages messages;
     KsCItfTypeNameRegistry registry;
-    KsCItfParseInfo info;
+    std::optional<KsCItfParseSession> session;
 
     FrontEnd() {
         pKSMemory = &memory;
@@ -34,13 +34,10 @@ struct FrontEnd {
         for (const char* name : {"sint8", "uint8", "sint16", "uint16", "sint32", "uint32",
                                  "float32", "float64", "boolean", "UNDEFINED_TYPE"})
             registry.addTypeName(name);
-        info.setFactory(&factory);
-        info.setMessages(&messages);
-        info.setTypeNameRegistry(&registry);
-        theParseInfo = &info;
+        session.emplace(&factory, &messages, &registry);
     }
     ~FrontEnd() {
-        theParseInfo = nullptr;
+        session.reset();
         factory.exit();
         pKSMemory = nullptr;
     }
@@ -63,7 +60,7 @@ void BM_Scan(benchmark::State& state) {
     std::size_t tokens = 0;
     for (auto _ : state) {
         for (const auto& file : suite()) {
-            frontEnd.info.setFileName(file.name);
+            frontEnd.session->info().setFileName(file.name);
             KsCItfScanner scanner;
             scanner.setInput(file.text.c_str());
             while (scanner.lex() > 0)
@@ -81,12 +78,7 @@ void BM_ScanParse(benchmark::State& state) {
     std::size_t nodes = 0;
     for (auto _ : state) {
         for (const auto& file : suite()) {
-            frontEnd.info.setSuccess(true);
-            frontEnd.info.setFileName(file.name);
-            KsCItfScanner scanner;
-            scanner.setInput(file.text.c_str());
-            KsCItfParser parser(150);
-            if (parser.parse(&scanner) != 0 || !frontEnd.info.isSuccess()) {
+            if (!frontEnd.session->parseFile(file.name, file.text.c_str())) {
                 state.SkipWithError("the generated suite does not parse");
                 return;
             }

@@ -4,14 +4,13 @@
 
 #include "ItfFactory/KsCItfFactory.h"
 #include "ItfMessages/KsCItfMessages.h"
-#include "ItfParser/KsCItfParser.h"
-#include "ItfScanner/KsCItfScanner.h"
-#include "ItfSrcRef/KsCItfParseInfo.h"
+#include "ItfParser/KsCItfParseSession.h"
 #include "ItfSrcRef/KsCItfSrcRefServer.h"
 #include "ItfTestSupport.h"
 #include "ItfTypeNameRegistry/KsCItfTypeNameRegistry.h"
 #include "KsCHostSrcRefServer.h"
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -24,27 +23,18 @@ protected:
         for (const char* name : {"sint8", "uint8", "sint16", "uint16", "sint32", "uint32",
                                  "float32", "boolean", "UNDEFINED_TYPE"})
             registry.addTypeName(name);
-        info.setFactory(&factory);
-        info.setMessages(&messages_);
-        info.setTypeNameRegistry(&registry);
-        theParseInfo = &info;
+        session.emplace(&factory, &messages_, &registry);
     }
     ~ItfParseTest() override {
-        theParseInfo = nullptr;
+        session.reset();
         factory.exit();
         srcRefServer.exit();
     }
 
     // Parses `text` as the file `base`; the root when the parse was accepted, else null.
-    KsCItfTranslationUnit* parse(const std::string& text, const char* base = "t") {
-        info.setSuccess(true);
-        info.setRoot(nullptr);
-        info.setFileName(base);
-        KsCItfScanner scanner;
-        scanner.setInput(text.c_str());
-        KsCItfParser parser(150);
-        result = parser.parse(&scanner);
-        return result == 0 && info.isSuccess() ? info.getRoot() : nullptr;
+    KsCItfTranslationUnit* parse(const std::string& text, const char* base = "t",
+                                 int depth = KsCItfParseSession::kParserDepth) {
+        return session->parseFile(base, text.c_str(), depth);
     }
 
     // The nodes of class T built so far, in creation order.
@@ -65,6 +55,5 @@ protected:
     KsCItfFactory factory;
     KsCItfMessages messages_;
     KsCItfTypeNameRegistry registry;
-    KsCItfParseInfo info;
-    int result = -1;
+    std::optional<KsCItfParseSession> session;
 };

@@ -6,9 +6,7 @@
 #include "ItfHostInterface/KS_Options.h"
 #include "ItfInput/KsCItfInput.h"
 #include "ItfMessages/KsCItfMessages.h"
-#include "ItfParser/KsCItfParser.h"
-#include "ItfScanner/KsCItfScanner.h"
-#include "ItfSrcRef/KsCItfParseInfo.h"
+#include "ItfParser/KsCItfParseSession.h"
 #include "ItfSrcRef/KsCItfSrcRefServer.h"
 #include "ItfTypeNameRegistry/KsCItfTypeNameRegistry.h"
 
@@ -26,30 +24,6 @@ template <class Server> bool finish(Server*& server) {
     server = nullptr;
     return true;
 }
-
-// The parser's stack depth for every test file.
-constexpr int kParserDepth = 150;
-
-// Designates a run's parse info for its whole duration and releases it on every way out.
-class ParseInfoScope {
-public:
-    ParseInfoScope(KsCItfFactory* factory, KsCItfMessages* messages,
-                   KsCItfTypeNameRegistry* registry)
-        : info_(new KsCItfParseInfo()) {
-        info_->setFactory(factory);
-        info_->setMessages(messages);
-        info_->setTypeNameRegistry(registry);
-        theParseInfo = info_;
-    }
-    ~ParseInfoScope() {
-        theParseInfo = nullptr;
-        delete info_;
-    }
-    KsCItfParseInfo* operator->() const { return info_; }
-
-private:
-    KsCItfParseInfo* info_;
-};
 
 // Owns the run's input files until the end of the run, whichever way it ends.
 struct InputFiles {
@@ -131,7 +105,7 @@ bool KsCItfControl::runTests() {
         reportInternalError("KsCItfControl", 103);
         return false;
     }
-    ParseInfoScope parseInfo(factory_, messages_, typeNameRegistry_);
+    KsCItfParseSession session(factory_, messages_, typeNameRegistry_);
     if (!typeNameRegistry_->loadTypedefs())
         return false;
     if (dumpWanted())
@@ -143,16 +117,8 @@ bool KsCItfControl::runTests() {
     KsCItfApplication* application = factory_->createApplication();
     bool allParsed = true;
     for (const KsCItfInputFile* file : input.files) {
-        KsCItfParser parser(kParserDepth);
-        KsCItfScanner scanner;
-        parseInfo->setSuccess(true);
-        parseInfo->setRoot(nullptr);
-        parseInfo->setFileName(file->getBaseName());
-        scanner.setInput(file->contentText());
-        bool accepted = parser.parse(&scanner) == 0;
-        KsCItfTranslationUnit* unit = parseInfo->getRoot();
-        if (accepted && parseInfo->isSuccess() && unit) {
-            unit->ModuleName = file->getBaseName();
+        if (KsCItfTranslationUnit* unit =
+                session.parseFile(file->getBaseName(), file->contentText())) {
             application->TranslationUnit.push_back(unit);
             unit->setParent(application);
         } else {

@@ -3,7 +3,7 @@
 #pragma once
 
 #include "ItfControl/KsCItfControlIF.h"
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 
 class KsCItfInput;
 class KsCItfFactory;

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "ItfControl/KsCItfControlIF.h"
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 
 class KsCItfControlDummy : public KsCItfControlIF, public KsCItfObject {
 public:

@@ -1,7 +1,7 @@
 #include "ItfControl/KsCItfControl.h"
 #include "ItfControl/KsCItfControlDummy.h"
 #include "ItfControl/KsCItfControlIF.h"
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 #include "ItfHostInterface/KS_Options.h"
 
 KsCItfControlIF::KsCItfControlIF() = default;

@@ -3,7 +3,8 @@
 // allocation pair; exit destroys them in creation order and returns the blocks.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
+#include "ItfBase/KsCItfTextPool.h"
 #include "ItfFactory/KsCItfOwnerList.h"
 #include "ItfFactory/KsCItfString.h"
 #include "ItfHostInterface/KS_Dump.h"
@@ -19,7 +20,7 @@
 
 class KsCItfSrcRef;
 
-class KsCItfFactory : public KsCItfObject {
+class KsCItfFactory : public KsCItfObject, public KsCItfTextPool {
 public:
     KsCItfFactory() = default;
     virtual ~KsCItfFactory();
@@ -34,7 +35,7 @@ public:
 
     // The pooled copy of a text, NUL-terminated, alive until exit: equal texts share one copy,
     // so positions and token texts hold a pointer instead of a string of their own.
-    const char* intern(std::string_view text);
+    const char* intern(std::string_view text) override;
 
     std::size_t objectCount() const { return dumpables_.size() + strings_.size(); }
     // Nodes and source positions in creation order.

@@ -2,7 +2,7 @@
 // linked as they fill, so that recording an object never copies the earlier records.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 
 #include <cstddef>
 

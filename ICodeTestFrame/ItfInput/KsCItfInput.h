@@ -2,7 +2,7 @@
 // read whole, the "znfxp" modules first.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 #include "ItfInput/KsCItfInputFile.h"
 
 #include <vector>

@@ -1,7 +1,7 @@
 // One test file read whole: its base name (the name without ".itf") and its text.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 #include "ItfHostInterface/ZnCXString.h"
 
 class KsCItfInputFile : public KsCItfObject {

@@ -2,7 +2,7 @@
 // host's message server.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 #include "ItfHostInterface/ZnCXString.h"
 
 #include <source_location>

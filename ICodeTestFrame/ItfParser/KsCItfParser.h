@@ -4,7 +4,7 @@
 // the file with one message.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 
 #include <cstddef>
 

@@ -3,7 +3,7 @@
 // is generated from the rule file KsCItfScanner.re.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 #include "ItfScanner/KsCItfToken.h"
 
 #include <cstddef>

@@ -1,7 +1,8 @@
 // The state that scanner and parser share during the parse of one file.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
+#include "ItfBase/KsCItfTextPool.h"
 #include "ItfHostInterface/ZnCXString.h"
 
 class KsCItfTranslationUnit;
@@ -23,7 +24,9 @@ public:
     KsCItfMessages* getMessages() const { return messages_; }
     void setTypeNameRegistry(KsCItfTypeNameRegistry* registry) { registry_ = registry; }
     KsCItfTypeNameRegistry* getTypeNameRegistry() const { return registry_; }
-    // Also pools the name in the node factory, for the positions of the file's nodes.
+    // Where the file name is pooled for the positions of the file's nodes: the node factory.
+    void setTextPool(KsCItfTextPool* pool) { pool_ = pool; }
+    // Also pools the name, when there is a pool.
     void setFileName(const ZnCXString& fileName);
     ZnCXString getFileName() const { return fileName_; }
     const char* pooledFileName() const { return pooledFileName_; }
@@ -34,6 +37,7 @@ private:
     KsCItfFactory* factory_ = nullptr;
     KsCItfMessages* messages_ = nullptr;
     KsCItfTypeNameRegistry* registry_ = nullptr;
+    KsCItfTextPool* pool_ = nullptr;
     ZnCXString fileName_;
     const char* pooledFileName_ = "";
 };

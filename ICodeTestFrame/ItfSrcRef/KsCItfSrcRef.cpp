@@ -1,13 +1,11 @@
 #include "ItfSrcRef/KsCItfSrcRef.h"
 
-#include "ItfFactory/KsCItfFactory.h"
-
 void KsCItfSrcRef::setFileName(const ZnCXString& fileName) {
-    fileName_ = factory_->intern(fileName.view());
+    fileName_ = pool_->intern(fileName.view());
 }
 
 void KsCItfSrcRef::setToken(const ZnCXString& token) {
-    token_ = factory_->intern(token.view());
+    token_ = pool_->intern(token.view());
 }
 
 KS_Dump* KsCItfSrcRef::dumpContents(KS_Dump* dump, bool) {

@@ -1,15 +1,14 @@
 // A position in a test file: file, line, column and the text of the token matched last.
 #pragma once
 
+#include "ItfBase/KsCItfTextPool.h"
 #include "ItfHostInterface/KS_Dump.h"
 #include "ItfHostInterface/ZnCXString.h"
-
-class KsCItfFactory;
 
 class KsCItfSrcRef : public KS_Dumpable {
 public:
     // Texts are pooled by the node factory, which outlives every position it made.
-    explicit KsCItfSrcRef(KsCItfFactory* factory) : factory_(factory) {}
+    explicit KsCItfSrcRef(KsCItfTextPool* pool) : pool_(pool) {}
 
     void setFileName(const ZnCXString& fileName);
     void setLine(int line) { line_ = line; }
@@ -31,7 +30,7 @@ public:
     KS_Dump* dumpContents(KS_Dump* dump, bool flag) override;
 
 private:
-    KsCItfFactory* factory_;
+    KsCItfTextPool* pool_;
     const char* fileName_ = "";
     int line_ = 0;
     int column_ = 0;

@@ -2,7 +2,7 @@
 // messages point back to the test file.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 
 #include <vector>
 

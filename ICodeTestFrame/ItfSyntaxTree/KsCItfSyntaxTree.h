@@ -3,7 +3,7 @@
 // fields written by the parser and read by the walkers; the node factory owns every node.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 #include "ItfHostInterface/KS_Dump.h"
 #include "ItfHostInterface/ZnCXString.h"
 #include "ItfSyntaxTree/KsCItfSyntaxTree.def"

@@ -2,7 +2,7 @@
 // loaded once per run before any file is parsed.
 #pragma once
 
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 #include "ItfHostInterface/ZnCXString.h"
 
 #include <string>

@@ -1,6 +1,7 @@
 #include "ItfScanner/KsCItfScanner.h"
 #include "ItfFactory/KsCItfFactory.h"
 #include "ItfMessages/KsCItfMessages.h"
+#include "ItfParser/KsCItfParseSession.h"
 #include "ItfSrcRef/KsCItfParseInfo.h"
 #include "ItfSrcRef/KsCItfSrcRefServer.h"
 #include "ItfTestSupport.h"
@@ -51,14 +52,11 @@ protected:
         srcRefServer.init(&hostSrcRefs);
         reporter.init(&srcRefServer, &factory);
         registry.init(nullptr, &reporter);
-        parseInfo.setFactory(&factory);
-        parseInfo.setMessages(&reporter);
-        parseInfo.setTypeNameRegistry(&registry);
-        parseInfo.setFileName("unit");
-        theParseInfo = &parseInfo;
+        session.emplace(&factory, &reporter, &registry);
+        session->info().setFileName("unit");
     }
     void TearDown() override {
-        theParseInfo = nullptr;
+        session.reset();
         KsCHostMessageServer::setScannerOutput(nullptr);
         if (output_)
             std::fclose(output_);
@@ -140,7 +138,7 @@ protected:
     KsCItfFactory factory;
     KsCItfMessages reporter;
     KsCItfTypeNameRegistry registry;
-    KsCItfParseInfo parseInfo;
+    std::optional<KsCItfParseSession> session;
 
 private:
     std::unique_ptr<char[]> input_;
@@ -439,7 +437,7 @@ TEST_F(KsCItfScannerTest, SyntaxErrorIsReportedAtTheTokenStartLineAndItsEndColum
     scanner.error("Syntax error");
     ASSERT_EQ(texts(), (std::vector<std::string>{"ICode test frame error: Syntax error in file "
                                                  "unit, line 4, column 17: Syntax error"}));
-    EXPECT_FALSE(parseInfo.isSuccess());
+    EXPECT_FALSE(session->info().isSuccess());
     ASSERT_EQ(scanner.lex(), T::IDENTIFIER);
     EXPECT_EQ(scanner.getLine(), 5);
 }
@@ -511,7 +509,7 @@ TEST_F(KsCItfScannerTest, OverflowIsReportedOnceWhereTheRefusedTokenStarts) {
     EXPECT_EQ(scanner.lex(), T::LEX_ERROR);
     EXPECT_EQ(texts(), (std::vector<std::string>{"ICode test frame error: Syntax error in file "
                                                  "unit, line 2, column 5: Token buffer overflow"}));
-    EXPECT_FALSE(parseInfo.isSuccess());
+    EXPECT_FALSE(session->info().isSuccess());
     // The file is abandoned: the scanner has nothing more to give.
     EXPECT_EQ(scanner.lex(), T::END_OF_INPUT);
     EXPECT_EQ(scanner.lex(), T::END_OF_INPUT);
@@ -641,17 +639,17 @@ TEST_F(KsCItfScannerTest, WorksWithoutParseInfo) {
     EXPECT_EQ(scanner.lex(), T::LEX_ERROR);
     scanner.error("Syntax error");
     EXPECT_TRUE(messages().empty());
-    EXPECT_TRUE(parseInfo.isSuccess());
+    EXPECT_TRUE(session->info().isSuccess());
 }
 
 TEST_F(KsCItfScannerTest, ErrorWithoutReporterStillClearsSuccess) {
-    parseInfo.setMessages(nullptr);
-    parseInfo.setTypeNameRegistry(nullptr);
+    session->info().setMessages(nullptr);
+    session->info().setTypeNameRegistry(nullptr);
     KsCItfScanner& scanner = start("INT");
     EXPECT_EQ(scanner.lex(), T::IDENTIFIER);
     scanner.error("Syntax error");
     EXPECT_TRUE(messages().empty());
-    EXPECT_FALSE(parseInfo.isSuccess());
+    EXPECT_FALSE(session->info().isSuccess());
 }
 
 // --- Large inputs ------------------------------------------------------------------------------

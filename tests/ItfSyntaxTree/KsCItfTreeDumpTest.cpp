@@ -70,7 +70,7 @@ TEST_F(KsCItfTreeDumpTest, EveryNodeAndPositionGetsALinkedPage) {
     EXPECT_NE(position.find("<span class=\"key\">Module</span> <span>t</span>"), std::string::npos);
 
     std::string unitPage = pageWith("<h1>KsCItfTranslationUnit</h1>");
-    EXPECT_NE(unitPage.find("<span class=\"key\">ModuleName</span> <span></span>"),
+    EXPECT_NE(unitPage.find("<span class=\"key\">ModuleName</span> <span>t</span>"),
               std::string::npos);
 }
 

@@ -1,4 +1,4 @@
-#include "ItfControl/KsCItfMemory.h"
+#include "ItfBase/KsCItfMemory.h"
 
 #include "ItfHostInterface/KsCMemController.h"
 
