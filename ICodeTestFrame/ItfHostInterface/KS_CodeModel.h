@@ -2,29 +2,26 @@
 // out the servers and factories through which every piece of ICode is created.
 #pragma once
 
+#include "KS_DataTypeServer.h"
+#include "KS_ExprDescr.h"
+#include "KS_Files.h"
+#include "KS_IterContext.h"
+#include "KS_ScaleServer.h"
+#include "KS_StatementTables.h"
+#include "KS_SymbolClasses.h"
+#include "KS_SymbolDB.h"
+#include "KS_Symbols.h"
 #include "KsHostApi.h"
 
 class KsCSrcRefServer;
-class KS_DataTypeServer;
 
-// Services whose operations the module calls through later components; each is a host object
+// Services whose operations the module calls through components still to come; each is a host object
 // the container hands out once.
 #define KS_HOST_SERVICE(Name)                                                                      \
     class KS_HOST_API Name {                                                                       \
     public:                                                                                        \
         virtual ~Name();                                                                           \
     };
-KS_HOST_SERVICE(KS_VariableSymbolServer)
-KS_HOST_SERVICE(KS_FunctionSymbolServer)
-KS_HOST_SERVICE(KS_MacroSymbolServer)
-KS_HOST_SERVICE(KS_ParamMacroSymbolServer)
-KS_HOST_SERVICE(KS_PointerTypeServer)
-KS_HOST_SERVICE(KS_ScaleServer)
-KS_HOST_SERVICE(KS_NumericalTypeServer)
-KS_HOST_SERVICE(KS_BaseTypeServer)
-KS_HOST_SERVICE(KS_FileServer)
-KS_HOST_SERVICE(KsCSmbClassServer)
-KS_HOST_SERVICE(KsCVarClassServer)
 KS_HOST_SERVICE(KS_RangeServer)
 KS_HOST_SERVICE(KS_ArithmeticOpFactory)
 KS_HOST_SERVICE(KsCOpBaseFactory)
@@ -40,11 +37,6 @@ KS_HOST_SERVICE(KsCStatementFactory)
 KS_HOST_SERVICE(KS_OpOperatorServer)
 KS_HOST_SERVICE(KS_ExprLocFactory)
 KS_HOST_SERVICE(KsCStmTableFactory)
-KS_HOST_SERVICE(KsCCvIterConFactory)
-KS_HOST_SERVICE(KsCCodeBlockDB)
-KS_HOST_SERVICE(KsCApplicationServer)
-KS_HOST_SERVICE(KS_ExpressionFactory)
-KS_HOST_SERVICE(KS_ExprDescrTupelServer)
 #undef KS_HOST_SERVICE
 
 class KS_HOST_API KS_SymbolServer {
