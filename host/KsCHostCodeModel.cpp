@@ -3,17 +3,6 @@
 #include "KsCHostDataDictionary.h"
 
 #define KS_HOST_SERVICE_DESTRUCTOR(Name) Name::~Name() = default;
-KS_HOST_SERVICE_DESTRUCTOR(KS_VariableSymbolServer)
-KS_HOST_SERVICE_DESTRUCTOR(KS_FunctionSymbolServer)
-KS_HOST_SERVICE_DESTRUCTOR(KS_MacroSymbolServer)
-KS_HOST_SERVICE_DESTRUCTOR(KS_ParamMacroSymbolServer)
-KS_HOST_SERVICE_DESTRUCTOR(KS_PointerTypeServer)
-KS_HOST_SERVICE_DESTRUCTOR(KS_ScaleServer)
-KS_HOST_SERVICE_DESTRUCTOR(KS_NumericalTypeServer)
-KS_HOST_SERVICE_DESTRUCTOR(KS_BaseTypeServer)
-KS_HOST_SERVICE_DESTRUCTOR(KS_FileServer)
-KS_HOST_SERVICE_DESTRUCTOR(KsCSmbClassServer)
-KS_HOST_SERVICE_DESTRUCTOR(KsCVarClassServer)
 KS_HOST_SERVICE_DESTRUCTOR(KS_RangeServer)
 KS_HOST_SERVICE_DESTRUCTOR(KS_ArithmeticOpFactory)
 KS_HOST_SERVICE_DESTRUCTOR(KsCOpBaseFactory)
@@ -29,11 +18,6 @@ KS_HOST_SERVICE_DESTRUCTOR(KsCStatementFactory)
 KS_HOST_SERVICE_DESTRUCTOR(KS_OpOperatorServer)
 KS_HOST_SERVICE_DESTRUCTOR(KS_ExprLocFactory)
 KS_HOST_SERVICE_DESTRUCTOR(KsCStmTableFactory)
-KS_HOST_SERVICE_DESTRUCTOR(KsCCvIterConFactory)
-KS_HOST_SERVICE_DESTRUCTOR(KsCCodeBlockDB)
-KS_HOST_SERVICE_DESTRUCTOR(KsCApplicationServer)
-KS_HOST_SERVICE_DESTRUCTOR(KS_ExpressionFactory)
-KS_HOST_SERVICE_DESTRUCTOR(KS_ExprDescrTupelServer)
 #undef KS_HOST_SERVICE_DESTRUCTOR
 
 KS_SymbolServer::~KS_SymbolServer() = default;
@@ -44,27 +28,17 @@ KsCCodeViewData::~KsCCodeViewData() = default;
 KS_ExprDescrComponent::~KS_ExprDescrComponent() = default;
 
 KsCHostCodeModel::KsCHostCodeModel(const KsCHostConfig& config)
-    : config_(config), scaleServer_(std::make_unique<KS_ScaleServer>()),
-      numTypeServer_(std::make_unique<KS_NumericalTypeServer>()),
-      baseTypeServer_(std::make_unique<KS_BaseTypeServer>()),
-      fileServer_(std::make_unique<KS_FileServer>()),
-      smbClassServer_(std::make_unique<KsCSmbClassServer>()),
-      varClassServer_(std::make_unique<KsCVarClassServer>()),
+    : config_(config), scaleServer_(config_), classServer_(config_, applicationServer_),
+      variableSymbols_(symbolDB_, scaleServer_), macroSymbols_(variableSymbols_),
+      functionSymbols_(symbolDB_, variableSymbols_), paramMacroSymbols_(functionSymbols_),
+      exprDescrServer_(config_, dataTypeServer_, classServer_, scaleServer_, symbolDB_,
+                       applicationServer_),
       rangeServer_(std::make_unique<KS_RangeServer>()),
       stdCFcnCallFactory_(std::make_unique<KS_StdCFunctionCallFactory>()),
       statementFactory_(std::make_unique<KsCStatementFactory>()),
       opOperatorServer_(std::make_unique<KS_OpOperatorServer>()),
       exprLocFactory_(std::make_unique<KS_ExprLocFactory>()),
       stmTableFactory_(std::make_unique<KsCStmTableFactory>()),
-      iterConFactory_(std::make_unique<KsCCvIterConFactory>()),
-      codeBlockDB_(std::make_unique<KsCCodeBlockDB>()),
-      applicationServer_(std::make_unique<KsCApplicationServer>()),
-      expressionFactory_(std::make_unique<KS_ExpressionFactory>()),
-      tupelServer_(std::make_unique<KS_ExprDescrTupelServer>()),
-      variableSymbols_(std::make_unique<KS_VariableSymbolServer>()),
-      functionSymbols_(std::make_unique<KS_FunctionSymbolServer>()),
-      macroSymbols_(std::make_unique<KS_MacroSymbolServer>()),
-      paramMacroSymbols_(std::make_unique<KS_ParamMacroSymbolServer>()),
       arithmetics_(std::make_unique<KS_ArithmeticOpFactory>()),
       baseOps_(std::make_unique<KsCOpBaseFactory>()), bitOps_(std::make_unique<KS_BitOpFactory>()),
       controlFlowOps_(std::make_unique<KS_ControlFlowOpFactory>()),
@@ -73,11 +47,58 @@ KsCHostCodeModel::KsCHostCodeModel(const KsCHostConfig& config)
       qsoRef_(std::make_unique<KS_QSORefFactory>()),
       qsoDeref_(std::make_unique<KS_QSODerefFactory>()),
       qsoVectorSlice_(std::make_unique<KS_QSOVectorSliceBaseFactory>()) {
-    dataTypeServer_.addTypedefs(config_);
+    // A configuration that parse accepted makes every type; one built by hand may leave some
+    // out, and what needs them is skipped.
+    std::string where, what;
+    dataTypeServer_.addConfiguredTypes(config_, where, what);
     KsCHostDataDictionary::install(&config_);
+    KsCHostSymbolDB::install(&symbolDB_);
+    addModelSymbols();
 }
 
 KsCHostCodeModel::~KsCHostCodeModel() {
     if (KsCHostDataDictionary::current() == &config_)
         KsCHostDataDictionary::install(nullptr);
+    if (KsCHostSymbolDB::current() == &symbolDB_)
+        KsCHostSymbolDB::install(nullptr);
+}
+
+// The model's functions and global variables, each in the C file of its module.
+void KsCHostCodeModel::addModelSymbols() {
+    for (const KsCHostModelSymbolConfig& f : config_.modelFunctions) {
+        KsCHostDataType* type = dataTypeServer_.find(f.type);
+        KsCHostSmbClass* fcnClass = f.className.empty()
+                                        ? classServer_.functionClass(config_.defaultFunctionClass)
+                                        : classServer_.functionClass(f.className);
+        KsCHostFile* file = applicationServer_.demandModuleFile(f.module);
+        if (!type || !file)
+            continue;
+        KS_Scaling* scaling = type->kind() == KsCHostDataType::Kind::Void
+                                  ? scaleServer_.getDefaultVoidScaling()
+                                  : scaleServer_.getDefaultScaling();
+        KsCHostParamSymbol* function =
+            functionSymbols_.make(KsEHostListingKind::Function, file, f.name, kKsCHostDefaultFlags,
+                                  type, scaling, fcnClass, nullptr);
+        for (const KsCHostParameterConfig& p : f.parameters) {
+            KsCHostDataType* parameterType = dataTypeServer_.find(p.type);
+            if (!parameterType)
+                continue;
+            function->addParameter(variableSymbols_.make(
+                KsEHostListingKind::Parameter, p.name, kKsCHostDefaultFlags, parameterType,
+                scaleServer_.getDefaultScaling(), classServer_.inputParameterDefault(), nullptr));
+        }
+    }
+    for (const KsCHostModelSymbolConfig& s : config_.modelSymbols) {
+        KsCHostDataType* type = dataTypeServer_.find(s.type);
+        KsCHostSmbClass* varClass =
+            s.className.empty() ? classServer_.variableClass(config_.defaultVariableClasses.global)
+                                : classServer_.variableClass(s.className);
+        KsCHostFile* file = applicationServer_.demandModuleFile(s.module);
+        if (!type || !file)
+            continue;
+        KsCHostUnparamSymbol* symbol =
+            variableSymbols_.make(KsEHostListingKind::Variable, s.name, kKsCHostDefaultFlags, type,
+                                  scaleServer_.getDefaultScaling(), varClass, nullptr);
+        file->table().symbols().addMember(symbol);
+    }
 }

@@ -1,15 +1,26 @@
 // The stand-in code model: the factory container, the code view data and the
 // expression-descriptor services that the host hands the module, built from the host
-// configuration. Everything the module creates in it is owned here.
+// configuration. Everything created in it is owned here, kept in creation order and readable
+// through the accessors below (the printer and the tests use them).
 #pragma once
 
 #include "ItfHostInterface/KS_CodeModel.h"
+#include "KsCHostApplicationServer.h"
+#include "KsCHostClassServer.h"
+#include "KsCHostCodeBlockDB.h"
 #include "KsCHostConfig.h"
 #include "KsCHostDataTypeServer.h"
+#include "KsCHostExprDescr.h"
+#include "KsCHostIterContext.h"
+#include "KsCHostScaleServer.h"
 #include "KsCHostSrcRefServer.h"
+#include "KsCHostSymbolDB.h"
+#include "KsCHostSymbolServers.h"
 
 #include <memory>
 
+// While it exists, the model's data dictionary and symbol database are the process's current
+// ones (a model made later takes over; the older one's destruction then leaves them alone).
 class KS_HOST_API KsCHostCodeModel : public KS_ICodeFactoryContainer,
                                      public KsCCodeViewData,
                                      public KS_ExprDescrComponent,
@@ -19,24 +30,43 @@ class KS_HOST_API KsCHostCodeModel : public KS_ICodeFactoryContainer,
 public:
     explicit KsCHostCodeModel(const KsCHostConfig& config);
     ~KsCHostCodeModel() override;
+    KsCHostCodeModel(const KsCHostCodeModel&) = delete;
+    KsCHostCodeModel& operator=(const KsCHostCodeModel&) = delete;
 
     KS_ICodeFactoryContainer* container() { return this; }
     KsCCodeViewData* codeViewData() { return this; }
     KS_ExprDescrComponent* exprDescrComponent() { return this; }
-    KS_ExprDescrTupelServer* tupelServer() { return tupelServer_.get(); }
+    KS_ExprDescrTupelServer* tupelServer() { return &exprDescrServer_; }
 
     KsCHostSrcRefServer& srcRefServer() { return srcRefServer_; }
     KsCHostDataTypeServer& dataTypeServer() { return dataTypeServer_; }
+    KsCHostScaleServer& scaleServer() { return scaleServer_; }
+    KsCHostClassServer& classServer() { return classServer_; }
+    KsCHostApplicationServer& applicationServer() { return applicationServer_; }
+    KsCHostSymbolDB& symbolDB() { return symbolDB_; }
+    KsCHostCodeBlockDB& codeBlockDB() { return codeBlockDB_; }
+    KsCHostIterContextFactory& iterContexts() { return iterContexts_; }
+    KsCHostExprDescrServer& exprDescrServer() { return exprDescrServer_; }
+    KsCHostVariableSymbolServer& variableSymbols() { return variableSymbols_; }
+    KsCHostFunctionSymbolServer& functionSymbols() { return functionSymbols_; }
+
+    const KsCHostDataTypeServer& dataTypeServer() const { return dataTypeServer_; }
+    const KsCHostScaleServer& scaleServer() const { return scaleServer_; }
+    const KsCHostClassServer& classServer() const { return classServer_; }
+    const KsCHostApplicationServer& applicationServer() const { return applicationServer_; }
+    const KsCHostSymbolDB& symbolDB() const { return symbolDB_; }
+    const KsCHostCodeBlockDB& codeBlockDB() const { return codeBlockDB_; }
+    const KsCHostIterContextFactory& iterContexts() const { return iterContexts_; }
 
     // KS_ICodeFactoryContainer
     KS_SymbolServer* getSymbolServer() override { return this; }
     KS_DataTypeServer* getDataTypeServer() override { return &dataTypeServer_; }
-    KS_ScaleServer* getScaleServer() override { return scaleServer_.get(); }
-    KS_NumericalTypeServer* getNumTypeServer() override { return numTypeServer_.get(); }
-    KS_BaseTypeServer* getBaseTypeServer() override { return baseTypeServer_.get(); }
-    KS_FileServer* getFileServer() override { return fileServer_.get(); }
-    KsCSmbClassServer* getSmbClassServer() override { return smbClassServer_.get(); }
-    KsCVarClassServer* getVarClassServer() override { return varClassServer_.get(); }
+    KS_ScaleServer* getScaleServer() override { return &scaleServer_; }
+    KS_NumericalTypeServer* getNumTypeServer() override { return &dataTypeServer_; }
+    KS_BaseTypeServer* getBaseTypeServer() override { return &dataTypeServer_; }
+    KS_FileServer* getFileServer() override { return &applicationServer_; }
+    KsCSmbClassServer* getSmbClassServer() override { return &classServer_; }
+    KsCVarClassServer* getVarClassServer() override { return &classServer_; }
     KS_RangeServer* getRangeServer() override { return rangeServer_.get(); }
     KS_OpFactories* getOpFactories() override { return this; }
     KS_QSOFactories* getQSOFactories() override { return this; }
@@ -45,21 +75,21 @@ public:
     KS_OpOperatorServer* getOpOperatorServer() override { return opOperatorServer_.get(); }
     KS_ExprLocFactory* getExprLocFactory() override { return exprLocFactory_.get(); }
     KsCStmTableFactory* getStatementTableFactory() override { return stmTableFactory_.get(); }
-    KsCCvIterConFactory* getCvIterContextFactory() override { return iterConFactory_.get(); }
+    KsCCvIterConFactory* getCvIterContextFactory() override { return &iterContexts_; }
 
     // KsCCodeViewData
-    KsCCodeBlockDB* getCodeBlockDB() override { return codeBlockDB_.get(); }
-    KsCApplicationServer* getApplServer() override { return applicationServer_.get(); }
+    KsCCodeBlockDB* getCodeBlockDB() override { return &codeBlockDB_; }
+    KsCApplicationServer* getApplServer() override { return &applicationServer_; }
     KsCSrcRefServer* getSrcRefServer() override { return &srcRefServer_; }
 
     // KS_ExprDescrComponent
-    KS_ExpressionFactory* getExpressionFactory() override { return expressionFactory_.get(); }
+    KS_ExpressionFactory* getExpressionFactory() override { return &exprDescrServer_; }
 
     // KS_SymbolServer
-    KS_VariableSymbolServer* getVariable() override { return variableSymbols_.get(); }
-    KS_FunctionSymbolServer* getFunction() override { return functionSymbols_.get(); }
-    KS_MacroSymbolServer* getMacro() override { return macroSymbols_.get(); }
-    KS_ParamMacroSymbolServer* getParamMacro() override { return paramMacroSymbols_.get(); }
+    KS_VariableSymbolServer* getVariable() override { return &variableSymbols_; }
+    KS_FunctionSymbolServer* getFunction() override { return &functionSymbols_; }
+    KS_MacroSymbolServer* getMacro() override { return &macroSymbols_; }
+    KS_ParamMacroSymbolServer* getParamMacro() override { return &paramMacroSymbols_; }
 
     // KS_OpFactories
     KS_ArithmeticOpFactory* getArithmetics() override { return arithmetics_.get(); }
@@ -79,31 +109,30 @@ public:
     const KsCHostConfig& config() const { return config_; }
 
 private:
+    void addModelSymbols();
+
     // The code model keeps its own copy: the data dictionary reads it for the model's lifetime.
     KsCHostConfig config_;
     KsCHostSrcRefServer srcRefServer_;
     KsCHostDataTypeServer dataTypeServer_;
-    std::unique_ptr<KS_ScaleServer> scaleServer_;
-    std::unique_ptr<KS_NumericalTypeServer> numTypeServer_;
-    std::unique_ptr<KS_BaseTypeServer> baseTypeServer_;
-    std::unique_ptr<KS_FileServer> fileServer_;
-    std::unique_ptr<KsCSmbClassServer> smbClassServer_;
-    std::unique_ptr<KsCVarClassServer> varClassServer_;
+    KsCHostScaleServer scaleServer_;
+    KsCHostApplicationServer applicationServer_;
+    KsCHostClassServer classServer_;
+    KsCHostSymbolDB symbolDB_;
+    KsCHostVariableSymbolServer variableSymbols_;
+    KsCHostMacroSymbolServer macroSymbols_;
+    KsCHostFunctionSymbolServer functionSymbols_;
+    KsCHostParamMacroSymbolServer paramMacroSymbols_;
+    KsCHostCodeBlockDB codeBlockDB_;
+    KsCHostIterContextFactory iterContexts_;
+    KsCHostExprDescrServer exprDescrServer_;
+    // Services whose operations arrive with later components.
     std::unique_ptr<KS_RangeServer> rangeServer_;
     std::unique_ptr<KS_StdCFunctionCallFactory> stdCFcnCallFactory_;
     std::unique_ptr<KsCStatementFactory> statementFactory_;
     std::unique_ptr<KS_OpOperatorServer> opOperatorServer_;
     std::unique_ptr<KS_ExprLocFactory> exprLocFactory_;
     std::unique_ptr<KsCStmTableFactory> stmTableFactory_;
-    std::unique_ptr<KsCCvIterConFactory> iterConFactory_;
-    std::unique_ptr<KsCCodeBlockDB> codeBlockDB_;
-    std::unique_ptr<KsCApplicationServer> applicationServer_;
-    std::unique_ptr<KS_ExpressionFactory> expressionFactory_;
-    std::unique_ptr<KS_ExprDescrTupelServer> tupelServer_;
-    std::unique_ptr<KS_VariableSymbolServer> variableSymbols_;
-    std::unique_ptr<KS_FunctionSymbolServer> functionSymbols_;
-    std::unique_ptr<KS_MacroSymbolServer> macroSymbols_;
-    std::unique_ptr<KS_ParamMacroSymbolServer> paramMacroSymbols_;
     std::unique_ptr<KS_ArithmeticOpFactory> arithmetics_;
     std::unique_ptr<KsCOpBaseFactory> baseOps_;
     std::unique_ptr<KS_BitOpFactory> bitOps_;

@@ -15,33 +15,12 @@ const KsCHostDDObject* objectOf(znddapi::DDHandle handle) {
     return &installed->ddObjects[handle];
 }
 
-// The handle of the path's object, or the invalid handle.
+// The handle of the path's object, or the invalid handle; the configuration indexes its paths.
 znddapi::DDHandle find(const char* path) {
     if (!installed || !path)
         return znddapi::kInvalidDDHandle;
-    long current = 0;
-    const char* p = path;
-    while (*p) {
-        while (*p == '/')
-            ++p;
-        if (!*p)
-            break;
-        const char* end = std::strchr(p, '/');
-        std::size_t length = end ? static_cast<std::size_t>(end - p) : std::strlen(p);
-        long next = znddapi::kInvalidDDHandle;
-        for (int child : installed->ddObjects[current].children) {
-            const std::string& name = installed->ddObjects[child].name;
-            if (name.size() == length && name.compare(0, length, p, length) == 0) {
-                next = child;
-                break;
-            }
-        }
-        if (next == znddapi::kInvalidDDHandle)
-            return next;
-        current = next;
-        p += length;
-    }
-    return current;
+    int found = installed->findPath(path);
+    return found < 0 ? znddapi::kInvalidDDHandle : found;
 }
 
 } // namespace

@@ -1,14 +1,22 @@
 #include "ItfControl/KsCItfControl.h"
 
+#include "ItfAdditionalInfo/KsCItfAdditionalInfoEvaluator.h"
 #include "ItfControl/KsCItfHostServices.h"
+#include "ItfDataType/KsCItfDataTypeServer.h"
 #include "ItfFactory/KsCItfFactory.h"
+#include "ItfFunctionServer/KsCItfFileServer.h"
+#include "ItfFunctionServer/KsCItfFunctionServer.h"
+#include "ItfICodeGenerator/KsCItfICodeGenerator.h"
+#include "ItfIterationContext/KsCItfIterationContextServer.h"
 #include "ItfHostInterface/KS_Dump.h"
 #include "ItfHostInterface/KS_Options.h"
 #include "ItfInput/KsCItfInput.h"
 #include "ItfMessages/KsCItfMessages.h"
 #include "ItfParser/KsCItfParseSession.h"
 #include "ItfSrcRef/KsCItfSrcRefServer.h"
+#include "ItfSymbolClass/KsCItfSymbolClassServer.h"
 #include "ItfTypeNameRegistry/KsCItfTypeNameRegistry.h"
+#include "ItfVariableServer/KsCItfVariableServer.h"
 
 #include <exception>
 
@@ -37,22 +45,50 @@ struct InputFiles {
 } // namespace
 
 KsCItfControl::KsCItfControl() {
-    input_ = new KsCItfInput();
-    factory_ = new KsCItfFactory();
-    messages_ = new KsCItfMessages();
-    typeNameRegistry_ = new KsCItfTypeNameRegistry();
-    srcRefServer_ = new KsCItfSrcRefServer();
+    try {
+        input_ = new KsCItfInput();
+        factory_ = new KsCItfFactory();
+        iCodeGenerator_ = new KsCItfICodeGenerator();
+        messages_ = new KsCItfMessages();
+        variableServer_ = new KsCItfVariableServer();
+        dataTypeServer_ = new KsCItfDataTypeServer();
+        fileServer_ = new KsCItfFileServer();
+        functionServer_ = new KsCItfFunctionServer();
+        symbolClassServer_ = new KsCItfSymbolClassServer();
+        typeNameRegistry_ = new KsCItfTypeNameRegistry();
+        srcRefServer_ = new KsCItfSrcRefServer();
+        iterationContextServer_ = new KsCItfIterationContextServer();
+        additionalInfoEvaluator_ = new KsCItfAdditionalInfoEvaluator();
+    } catch (...) {
+        releaseServers();
+        throw;
+    }
 }
 
 KsCItfControl::~KsCItfControl() {
-    if (exit())
-        return;
-    // A server refused to finish: release the rest anyway so nothing outlives the object.
-    delete input_;
-    delete factory_;
-    delete messages_;
-    delete typeNameRegistry_;
-    delete srcRefServer_;
+    // A server that refused to finish is released anyway, so nothing outlives the object.
+    if (!exit())
+        releaseServers();
+}
+
+void KsCItfControl::releaseServers() {
+    auto release = [](auto*& server) {
+        delete server;
+        server = nullptr;
+    };
+    release(input_);
+    release(factory_);
+    release(iCodeGenerator_);
+    release(messages_);
+    release(variableServer_);
+    release(dataTypeServer_);
+    release(fileServer_);
+    release(functionServer_);
+    release(symbolClassServer_);
+    release(typeNameRegistry_);
+    release(srcRefServer_);
+    release(iterationContextServer_);
+    release(additionalInfoEvaluator_);
 }
 
 bool KsCItfControl::init(KS_ICodeFactoryContainer* container, KS_ExprDescrComponent* exprDescr,
@@ -72,23 +108,66 @@ bool KsCItfControl::initServers(KS_ICodeFactoryContainer* container,
                                 KS_ExprDescrComponent* exprDescr, KsCCodeViewData* codeViewData,
                                 KS_ExprDescrTupelServer* tupelServer) {
     const KsCItfHostServices host = KsCItfHostServices::fetch(container, exprDescr, codeViewData);
-    (void)tupelServer;
+    KsCFcnClassServer* fcnClassServer =
+        host.smbClassServer ? host.smbClassServer->getFcnClassServer() : nullptr;
+    KsCSmbClassMutator* classMutator =
+        host.smbClassServer ? host.smbClassServer->getClassMutator() : nullptr;
+    // The order is the host's contract: each server only stores what it is given, so servers
+    // initialised later may be handed on already.
     if (input_ && !input_->init())
         return false;
     if (factory_ && !factory_->init())
         return false;
+    if (iCodeGenerator_ &&
+        !iCodeGenerator_->init(fileServer_, messages_, dataTypeServer_, variableServer_,
+                               functionServer_, iCodeFactory_, iterationContextServer_,
+                               host.codeBlockDB))
+        return false;
     if (messages_ && !messages_->init(srcRefServer_, factory_))
+        return false;
+    if (variableServer_ &&
+        !variableServer_->init(host.variableSymbolServer, host.scaleServer, symbolClassServer_,
+                               host.functionSymbolServer, tupelServer, host.expressionFactory,
+                               messages_, host.pointerTypeServer, exprDescr, srcRefServer_,
+                               additionalInfoEvaluator_, host.macroSymbolServer, container))
+        return false;
+    if (dataTypeServer_ &&
+        !dataTypeServer_->init(host.baseTypeServer, host.dataTypeServer, host.numTypeServer,
+                               host.pointerTypeServer, srcRefServer_, messages_))
+        return false;
+    if (fileServer_ &&
+        !fileServer_->init(host.fileServer, host.applicationServer, messages_, srcRefServer_))
+        return false;
+    if (functionServer_ &&
+        !functionServer_->init(host.functionSymbolServer, host.scaleServer, symbolClassServer_,
+                               messages_, srcRefServer_, additionalInfoEvaluator_,
+                               host.codeBlockDB, host.paramMacroSymbolServer))
+        return false;
+    if (symbolClassServer_ &&
+        !symbolClassServer_->init(host.varClassServer, fcnClassServer, classMutator,
+                                  srcRefServer_, messages_))
         return false;
     if (typeNameRegistry_ && !typeNameRegistry_->init(host.dataTypeServer, messages_))
         return false;
     if (srcRefServer_ && !srcRefServer_->init(host.srcRefServer))
         return false;
+    if (iterationContextServer_ &&
+        !iterationContextServer_->init(messages_, host.iterContextFactory, variableServer_))
+        return false;
+    if (additionalInfoEvaluator_ &&
+        !additionalInfoEvaluator_->init(messages_, host.scaleServer, symbolClassServer_,
+                                        srcRefServer_, dataTypeServer_))
+        return false;
     return true;
 }
 
+// The operation factory and the expression location database join the orders at their places
+// when they are built.
 bool KsCItfControl::exit() {
-    return finish(input_) && finish(factory_) && finish(messages_) && finish(typeNameRegistry_) &&
-           finish(srcRefServer_);
+    return finish(input_) && finish(factory_) && finish(iCodeGenerator_) && finish(messages_) &&
+           finish(variableServer_) && finish(dataTypeServer_) && finish(fileServer_) &&
+           finish(functionServer_) && finish(symbolClassServer_) && finish(typeNameRegistry_) && finish(srcRefServer_) &&
+           finish(iterationContextServer_) && finish(additionalInfoEvaluator_);
 }
 
 bool KsCItfControl::run() {
@@ -101,7 +180,8 @@ bool KsCItfControl::run() {
 }
 
 bool KsCItfControl::runTests() {
-    if (!input_ || !factory_ || !messages_ || !typeNameRegistry_) {
+    if (!input_ || !factory_ || !messages_ || !typeNameRegistry_ || !iCodeGenerator_ ||
+        !iterationContextServer_ || !functionServer_) {
         reportInternalError("KsCItfControl", 103);
         return false;
     }
@@ -130,8 +210,12 @@ bool KsCItfControl::runTests() {
         return false;
     if (dumpWanted())
         dumpApplication(application);
-    // The hand-over to the ICode generator joins here.
-    return true;
+    bool generated = iCodeGenerator_->generate(application);
+    if (dumpWanted()) {
+        iterationContextServer_->dump();
+        functionServer_->dump();
+    }
+    return generated;
 }
 
 bool KsCItfControl::dumpWanted() const {

@@ -61,6 +61,8 @@ private:
     bool initServers(KS_ICodeFactoryContainer* container, KS_ExprDescrComponent* exprDescr,
                      KsCCodeViewData* codeViewData, KS_ExprDescrTupelServer* tupelServer);
     bool runTests();
+    // Deletes every server without finishing it: the fallback of a failed construction or exit.
+    void releaseServers();
     // The host's switch for the HTML dumps of a run (type names, syntax trees).
     bool dumpWanted() const;
     // Writes the syntax trees of a run as HTML pages, "ItfApplication.html" the first.

@@ -3,6 +3,9 @@
 #include "ItfControl/KsCItfControlIF.h"
 #include "ItfBase/KsCItfMemory.h"
 #include "ItfHostInterface/KS_Options.h"
+#include "ItfMessages/KsCItfMessages.h"
+
+#include <exception>
 
 KsCItfControlIF::KsCItfControlIF() = default;
 KsCItfControlIF::~KsCItfControlIF() = default;
@@ -17,10 +20,17 @@ KsCIvToCvTestFactory::~KsCIvToCvTestFactory() {
 KsCItfControlIF* KsCIvToCvTestFactory::getICodeTest() {
     if (control_)
         return control_;
-    if (options_ && options_->getEnableICodeTest())
-        control_ = new KsCItfControl();
-    else
-        control_ = new KsCItfControlDummy();
+    try {
+        if (options_ && options_->getEnableICodeTest())
+            control_ = new KsCItfControl();
+        else
+            control_ = new KsCItfControlDummy();
+    } catch (const std::exception&) {
+        // Never an exception into the host: it gets an object that fails every operation.
+        reportInternalError("KsCIvToCvTestFactory", 100);
+        static KsCItfControlUnavailable unavailable;
+        return &unavailable;
+    }
     return control_;
 }
 

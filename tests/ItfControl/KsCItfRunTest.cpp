@@ -43,8 +43,8 @@ protected:
 };
 
 TEST_F(KsCItfRunTest, FilesThatParseMakeASuccessfulRun) {
-    dir.write("a.itf", "sint16 x;\nint f() { x = x + 1; }\n");
-    dir.write("b.itf", "DEFINE_ITERATION_CONTEXT(NAME = ic, RANGE = 0:3)\n");
+    dir.write("a.itf", "sint16 x;\nint f() { sint16 y; }\n");
+    dir.write("b.itf", "DEFINE_ITERATION_CONTEXT(NAME = ic, SLICE = 0:3)\n");
     EXPECT_TRUE(run());
     EXPECT_TRUE(messages().empty()) << messages()[0].text;
 }
@@ -119,7 +119,8 @@ private:
     std::size_t budget_;
 };
 
-// Runs the control over the current directory with the given controller; the run's result.
+// Runs the module over the current directory with the given controller, the way the host does
+// it; the run's result.
 bool runWith(KsCHostMemController& memory) {
     KsCHostMessageServer::instance().clear();
     pKSMemory = &memory;
@@ -127,42 +128,62 @@ bool runWith(KsCHostMemController& memory) {
     {
         KsCHostCodeModel model(KsCHostConfig::embeddedDefault());
         KsCHostOptions options;
-        KsCItfControl control;
-        EXPECT_TRUE(control.init(model.container(), model.exprDescrComponent(),
-                                 model.codeViewData(), model.tupelServer(), &options));
-        result = control.run();
+        auto* factory = new KsCIvToCvTestFactory(&options);
+        KsCItfControlIF* control = factory->getICodeTest();
+        result = control->init(model.container(), model.exprDescrComponent(),
+                               model.codeViewData(), model.tupelServer(), &options) &&
+                 control->run();
+        control->exit();
         EXPECT_EQ(theParseInfo, nullptr);
-        EXPECT_TRUE(control.exit());
+        delete factory;
     }
     pKSMemory = nullptr;
     return result;
 }
 
+// Changes into a folder for the scope, and back on every way out.
+class CurrentPath {
+public:
+    explicit CurrentPath(const std::filesystem::path& path) { std::filesystem::current_path(path); }
+    ~CurrentPath() { std::filesystem::current_path(previous_); }
+
+private:
+    std::filesystem::path previous_ = std::filesystem::current_path();
+};
+
 TEST(KsCItfRunMemoryTest, ExhaustedMemoryIsAnInternalErrorAndNothingLeaks) {
     ItfTempDir dir;
     std::string text;
-    // Nested deep enough that the parser's stacks grow.
-    const std::string nested = std::string(25, '(') + "a" + std::string(25, ')');
-    for (int i = 0; i < 2000; ++i)
-        text += "int f" + std::to_string(i) + "() { x = " + nested + " * c[IC_INFO(IC = ic)]; }\n";
+    // Files, functions, parameters, locals, globals and iteration contexts: every server of
+    // the generation allocates.
+    for (int i = 0; i < 500; ++i) {
+        std::string n = std::to_string(i);
+        text += "SMB_INFO(MIN = -1, MAX = 1) sint16 g" + n + "[2] = {1, 2};\n" +
+                "DEFINE_ITERATION_CONTEXT(NAME = ic" + n + ", SLICE = 0:3)\n" +
+                "int f" + n + "(sint16 a, sint16 *b) { sint16 x; int y = 1; }\n";
+    }
     dir.write("big.itf", text);
-    auto previous = std::filesystem::current_path();
-    std::filesystem::current_path(dir.path());
+    dir.write("small.itf", "int h(int a);\nint h(int a) { }\n");
+    CurrentPath inside(dir.path());
 
     KsCHostMemController plenty;
     ASSERT_TRUE(runWith(plenty));
     const std::size_t needed = plenty.totalBlocks();
     // Memory runs out at points spread over the whole run, the parse included.
-    for (std::size_t budget = 5; budget < needed; budget += needed / 12 + 1) {
+    // The first block is the factory, which the host makes; from the second on, the module.
+    for (std::size_t budget = 1; budget < needed; budget += needed / 16 + 1) {
         ExhaustedMemory memory(budget);
         EXPECT_FALSE(runWith(memory)) << budget;
         EXPECT_EQ(memory.liveBlocks(), 0u) << budget;
+        // One internal error: of the factory, of init or of run, depending on where.
         const auto& messages = KsCHostMessageServer::instance().messages();
         ASSERT_EQ(messages.size(), 1u) << budget;
-        EXPECT_EQ(messages[0].text, "Internal error. Error code: KsCItfControl 102. Contact "
-                                    "Zandor's technical support team.");
+        EXPECT_EQ(messages[0].number, 10007) << budget;
+        EXPECT_TRUE(messages[0].text.starts_with("Internal error. Error code: KsCIvToCvTestFactory "
+                                                 "100.") ||
+                    messages[0].text.starts_with("Internal error. Error code: KsCItfControl 10"))
+            << budget << ": " << messages[0].text;
     }
-    std::filesystem::current_path(previous);
     KsCHostMessageServer::instance().clear();
 }
 

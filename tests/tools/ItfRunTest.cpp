@@ -1,11 +1,18 @@
 // itf-run as a user meets it: exit statuses, the JSON document, the text lines.
+#include "ItfControl/KsCItfControl.h"
 #include "ItfTestSupport.h"
+#include "KsCHostCodeModel.h"
+#include "KsCHostICodePrinter.h"
+#include "KsCHostOptions.h"
 
 #include <nlohmann/json.hpp>
 
 #include <gtest/gtest.h>
 
 namespace {
+
+// Declarations only: a file the front end and the ICode generator both take.
+const char* const kParsingFile = "sint16 x;\nsint16 f(sint16 a)\n{\n    sint32 sum = 0;\n}\n";
 
 std::string itfRun(const std::string& args) {
     return std::string(ITF_RUN_PATH) + " " + args;
@@ -90,7 +97,7 @@ TEST(ItfRunTest, SyntaxErrorsAreMessagesAndAFailedRun) {
 TEST(ItfRunTest, DumpTreeWritesBrowsablePages) {
     ItfTempDir dir;
     ItfTempDir pages;
-    dir.write("a.itf", "int f() { x = 1; }\n");
+    dir.write("a.itf", kParsingFile);
     auto r = runCommand(
         itfRun("--dump-tree " + (pages.path() / "out").string() + " " + dir.path().string()));
     EXPECT_EQ(r.status, 0);
@@ -105,6 +112,79 @@ TEST(ItfRunTest, DumpTreeWritesBrowsablePages) {
     for ([[maybe_unused]] const auto& entry : std::filesystem::directory_iterator(dir.path()))
         ++inTests;
     EXPECT_EQ(inTests, 1);
+}
+
+} // namespace
+
+namespace {
+
+// What the host prints of the code model after the module ran over `dir` in this process:
+// the reference for what itf-run must show.
+struct InProcessRun {
+    std::string listing;
+    std::string json;
+};
+InProcessRun runInProcess(const std::filesystem::path& dir) {
+    std::filesystem::path previous = std::filesystem::current_path();
+    KsCHostMessageServer::instance().clear();
+    KsCHostMessageServer::setScannerOutput(nullptr);
+    KsCHostMemController memory;
+    pKSMemory = &memory;
+    InProcessRun printed;
+    {
+        KsCHostOptions options;
+        KsCHostCodeModel model(KsCHostConfig::embeddedDefault());
+        KsCItfControl control;
+        std::filesystem::current_path(dir);
+        if (control.init(model.container(), model.exprDescrComponent(), model.codeViewData(),
+                         model.tupelServer(), &options))
+            control.run();
+        control.exit();
+        printed.listing = KsCHostICodePrinter::listing(model);
+        printed.json = KsCHostICodePrinter::json(model);
+    }
+    pKSMemory = nullptr;
+    KsCHostMessageServer::instance().clear();
+    std::filesystem::current_path(previous);
+    return printed;
+}
+
+TEST(ItfRunTest, TextModePrintsTheListingOnStandardOutput) {
+    ItfTempDir dir;
+    dir.write("a.itf", kParsingFile);
+    InProcessRun expected = runInProcess(dir.path());
+    auto r = runCommand(itfRun(dir.path().string() + " 2>/dev/null"));
+    EXPECT_EQ(r.status, 0);
+    EXPECT_EQ(r.out, expected.listing);
+    ASSERT_FALSE(expected.listing.empty()) << "the run left no ICode to show";
+}
+
+TEST(ItfRunTest, MessagesStayOffStandardOutput) {
+    ItfTempDir dir;
+    dir.write("a.itf", "int f() { x = ; }\n");
+    auto r = runCommand(itfRun(dir.path().string() + " 2>/dev/null"));
+    EXPECT_EQ(r.status, 1);
+    EXPECT_EQ(r.out, "");
+}
+
+TEST(ItfRunTest, JsonCarriesTheICodeAsData) {
+    ItfTempDir dir;
+    dir.write("a.itf", kParsingFile);
+    InProcessRun expected = runInProcess(dir.path());
+    auto r = runCommand(itfRun("--format json " + dir.path().string()));
+    EXPECT_EQ(r.status, 0);
+    auto document = nlohmann::ordered_json::parse(r.out);
+    const auto& icode = document["icode"];
+    ASSERT_TRUE(icode.is_object()) << icode.dump();
+    ASSERT_TRUE(icode.contains("files"));
+    EXPECT_TRUE(icode["files"].is_array());
+    // The same document as the host printed, key order included.
+    EXPECT_EQ(icode, nlohmann::ordered_json::parse(expected.json));
+
+    // No ICode after a syntax error, but still the object with its list.
+    dir.write("b.itf", "int f() { x = ; }\n");
+    auto failed = nlohmann::json::parse(runCommand(itfRun("--format json " + dir.path().string())).out);
+    EXPECT_EQ(failed["icode"], nlohmann::json::parse(R"({"files": []})"));
 }
 
 } // namespace

@@ -1,13 +1,11 @@
 // itf-run: drives the test frame module the way the code generator does, over the test files
-// of one directory, and shows what it reported.
-#include "ItfControl/KsCItfControlIF.h"
+// of one directory, and shows what it reported; or, in check mode, compares the runs of
+// several suites with the expectations stored beside them.
+#include "ItfCheck.h"
 #include "ItfHostInterface/KS_Dump.h"
 #include "ItfRunReport.h"
-#include "KsCHostCodeModel.h"
+#include "ItfRunSession.h"
 #include "KsCHostConfig.h"
-#include "KsCHostMemController.h"
-#include "KsCHostMessageServer.h"
-#include "KsCHostOptions.h"
 
 #include <CLI/CLI.hpp>
 
@@ -15,6 +13,7 @@
 #include <filesystem>
 #include <string>
 #include <system_error>
+#include <vector>
 
 namespace {
 
@@ -27,7 +26,9 @@ struct Arguments {
     bool disable = false;
     bool showInternalInfo = false;
     std::string dumpTree;
-    std::string directory = ".";
+    bool check = false;
+    bool update = false;
+    std::vector<std::string> directories;
 };
 
 int usageError(const std::string& why) {
@@ -35,12 +36,49 @@ int usageError(const std::string& why) {
     return kUsageError;
 }
 
+int runOnce(const Arguments& args, const KsCHostConfig& config) {
+    std::string directory = args.directories.empty() ? "." : args.directories.front();
+    std::error_code ec;
+    if (!std::filesystem::is_directory(directory, ec))
+        return usageError("not a directory: " + directory);
+    if (!args.dumpTree.empty()) {
+        std::filesystem::path dump = std::filesystem::absolute(args.dumpTree, ec);
+        std::filesystem::create_directories(dump, ec);
+        if (!std::filesystem::is_directory(dump, ec))
+            return usageError("cannot create the dump folder " + args.dumpTree);
+        KS_DumpHtml::setOutputDirectory(dump.string());
+    }
+
+    ItfRunSettings settings;
+    settings.defaultLevel = args.defaultLevel;
+    settings.disable = args.disable;
+    settings.showInternalInfo = args.showInternalInfo;
+    settings.dumpTree = !args.dumpTree.empty();
+    settings.wantListing = args.format == "text";
+    settings.wantJson = args.format == "json";
+    ItfSuiteRun run;
+    std::string error;
+    if (!runItf(directory, config, settings, run, error))
+        return usageError(error);
+
+    bool shown = true;
+    if (args.format == "json")
+        shown = writeJsonReport(run, stdout, stderr);
+    else
+        writeTextReport(run, stdout, stderr);
+    std::string leak = leakText(run);
+    if (!leak.empty())
+        std::fprintf(stderr, "itf-run: %s\n", leak.c_str());
+    return run.outcome.succeeded() && shown ? 0 : 1;
+}
+
 } // namespace
 
 int main(int argc, char** argv) {
     Arguments args;
     CLI::App app{"Runs the ICode test frame over the test files (*itf) of DIR and shows the "
-                 "messages and the ICode it produced.",
+                 "messages and the ICode it produced; with --check, compares the runs of "
+                 "suite folders with their expected/ files.",
                  "itf-run"};
     app.add_option("--format", args.format, "Output format")
         ->check(CLI::IsMember({"text", "json"}))
@@ -53,9 +91,18 @@ int main(int argc, char** argv) {
     app.add_flag("--disable", args.disable, "Switch the ICode test off (the host's option)");
     app.add_flag("--show-internal-info", args.showInternalInfo,
                  "Debug report of internal errors on standard error");
-    app.add_option("--dump-tree", args.dumpTree,
-                   "Write the syntax-tree HTML dump (ItfApplication.html) into this folder");
-    app.add_option("DIR", args.directory, "Folder of the test files (default: current)");
+    CLI::Option* dumpTree =
+        app.add_option("--dump-tree", args.dumpTree,
+                       "Write the syntax-tree HTML dump (ItfApplication.html) into this folder");
+    CLI::Option* check = app.add_flag(
+        "--check", args.check,
+        "Run each DIR as a suite and compare with DIR/expected/messages.txt and icode.txt");
+    check->excludes(dumpTree);
+    app.add_flag("--update", args.update,
+                 "With --check: write the expectation files from the runs instead")
+        ->needs(check);
+    app.add_option("DIR", args.directories,
+                   "Folder of the test files (default: current); with --check, suite folders");
     app.set_version_flag("--version", std::string("itf-run ") + ITF_VERSION);
     try {
         app.parse(argc, argv);
@@ -64,6 +111,10 @@ int main(int argc, char** argv) {
     } catch (const CLI::ParseError& e) {
         return usageError(e.what());
     }
+    if (args.check && args.format != "text")
+        return usageError("--check reports as text; --format json does not apply");
+    if (!args.check && args.directories.size() > 1)
+        return usageError("one DIR at most (several suites need --check)");
 
     KsCHostConfig config;
     std::string error;
@@ -72,51 +123,13 @@ int main(int argc, char** argv) {
     else if (!KsCHostConfig::load(args.configFile, config, error))
         return usageError(error);
 
-    std::error_code ec;
-    if (!std::filesystem::is_directory(args.directory, ec))
-        return usageError("not a directory: " + args.directory);
-    if (!args.dumpTree.empty()) {
-        std::filesystem::path dump = std::filesystem::absolute(args.dumpTree, ec);
-        std::filesystem::create_directories(dump, ec);
-        if (!std::filesystem::is_directory(dump, ec))
-            return usageError("cannot create the dump folder " + args.dumpTree);
-        KS_DumpHtml::setOutputDirectory(dump.string());
-    }
-    // The module takes the test files of the process's current directory.
-    std::filesystem::current_path(args.directory, ec);
-    if (ec)
-        return usageError("cannot enter " + args.directory + ": " + ec.message());
-
-    KsCHostOptions options;
-    options.enableICodeTest = !args.disable;
-    options.defaultOperationLevel = args.defaultLevel;
-    options.dumpTree = !args.dumpTree.empty();
-    KsCHostMessageServer::setShowInternalInfo(args.showInternalInfo);
-    // Bytes the scanner passes through carry no meaning and must not mix with the output.
-    KsCHostMessageServer::setScannerOutput(nullptr);
-
-    KsCHostMemController memory;
-    pKSMemory = &memory;
-    ItfRunOutcome outcome;
-    {
-        KsCHostCodeModel model(config);
-        auto* factory = new KsCIvToCvTestFactory(&options);
-        KsCItfControlIF* control = factory->getICodeTest();
-        outcome.init = control->init(model.container(), model.exprDescrComponent(),
-                                     model.codeViewData(), model.tupelServer(), &options);
-        outcome.run = outcome.init && control->run();
-        outcome.exit = control->exit();
-        delete factory;
-
-        const auto& messages = KsCHostMessageServer::instance().messages();
-        if (args.format == "json")
-            writeJsonReport(outcome, messages, stdout);
-        else
-            writeTextReport(messages, stderr);
-    }
-    pKSMemory = nullptr;
-    if (memory.liveBlocks() != 0)
-        std::fprintf(stderr, "itf-run: the module left %zu blocks (%zu bytes) allocated\n",
-                     memory.liveBlocks(), memory.liveBytes());
-    return outcome.init && outcome.run && outcome.exit ? 0 : 1;
+    if (!args.check)
+        return runOnce(args, config);
+    ItfCheckRequest request;
+    request.suites = args.directories;
+    request.update = args.update;
+    request.settings.defaultLevel = args.defaultLevel;
+    request.settings.disable = args.disable;
+    request.settings.showInternalInfo = args.showInternalInfo;
+    return runCheck(request, config, stdout, stderr);
 }

@@ -1,0 +1,55 @@
+// Host statement tables and their symbol tables: a file's table holds its global symbols, a
+// function's parameter table its parameters, a body's table its locals; each knows the table
+// it is nested in, so that name lookups walk outwards.
+#pragma once
+
+#include "ItfHostInterface/KS_StatementTables.h"
+
+#include <string>
+#include <unordered_map>
+#include <unordered_set>
+#include <vector>
+
+class KS_HOST_API KsCHostSymbolTable : public KsCSymbolTable {
+public:
+    KsCHostSymbolTable(KS_StatementTable* stt, KsCIcFileId* file);
+    ~KsCHostSymbolTable() override;
+
+    const std::vector<KsCSymbol*>& getMembers() const override { return members_; }
+    const std::vector<KsCSymbol*>* findMembers(const ZnCXString& name) const override;
+    // The first table a host symbol enters becomes its symbol table.
+    void addMember(KsCSymbol* symbol) override;
+    bool removeMember(KsCSymbol* symbol) override;
+    KS_StatementTable* getStt() const override { return stt_; }
+    KsCIcFileId* getFile() const override { return file_; }
+
+    bool contains(const KsCSymbol* symbol) const { return memberSet_.contains(symbol); }
+
+private:
+    KS_StatementTable* stt_;
+    KsCIcFileId* file_;
+    std::vector<KsCSymbol*> members_;
+    std::unordered_set<const KsCSymbol*> memberSet_;
+    std::unordered_map<std::string, std::vector<KsCSymbol*>> byName_;
+};
+
+class KS_HOST_API KsCHostStatementTable : public KsCCodeStmTable {
+public:
+    enum class Kind { File, Parameters, Body };
+
+    KsCHostStatementTable(Kind kind, KS_StatementTable* parent, KsCIcFileId* file);
+    ~KsCHostStatementTable() override;
+
+    KS_StatementTable* getParentStatementTable() const override { return parent_; }
+    KsCSymbolTable* getSymbolTable() const override;
+
+    Kind kind() const { return kind_; }
+    const KsCHostSymbolTable& symbols() const { return symbols_; }
+    KsCHostSymbolTable& symbols() { return symbols_; }
+    // Statements join the table here once the statement factory makes them.
+
+private:
+    Kind kind_;
+    KS_StatementTable* parent_;
+    KsCHostSymbolTable symbols_;
+};
