@@ -11,7 +11,9 @@
 
 #include <benchmark/benchmark.h>
 
+#include <algorithm>
 #include <cstdio>
+#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <optional>
@@ -102,9 +104,17 @@ BENCHMARK(BM_ScanParse)->Unit(benchmark::kMillisecond);
 
 } // namespace
 
+void writeGenerationSuite(const std::filesystem::path& folder, int scale);
+
 // `itf-bench --write-suite DIR` writes the generated suite as test files, for timing whole
-// runs of itf-run over it; without it the benchmarks run.
+// runs of itf-run over it; `--write-generation-suite DIR [SCALE]` the declaration suite (SCALE
+// times the benchmark's, default 1) with its two host configurations (*.json, beside the test
+// files); without them the benchmarks run.
 int main(int argc, char** argv) {
+    if ((argc == 3 || argc == 4) && std::string_view(argv[1]) == "--write-generation-suite") {
+        writeGenerationSuite(argv[2], argc == 4 ? std::max(1, std::atoi(argv[3])) : 1);
+        return 0;
+    }
     if (argc == 3 && std::string_view(argv[1]) == "--write-suite") {
         std::filesystem::create_directories(argv[2]);
         for (const auto& file : suite())

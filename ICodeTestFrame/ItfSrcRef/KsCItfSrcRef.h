@@ -18,6 +18,9 @@ public:
     int getLine() const { return line_; }
     int getColumn() const { return column_; }
     ZnCXString getToken() const { return ZnCXString(token_); }
+    // The pooled texts themselves, without a copy.
+    const char* fileNameText() const { return fileName_; }
+    const char* tokenText() const { return token_; }
 
     // The parser's path: texts that are already pooled.
     void setPosition(const char* pooledFileName, int line, int column, const char* pooledToken) {

@@ -41,7 +41,8 @@ protected:
     }
 
     // A suite folder under `root` with test files and, when given, its expectation files.
-    void suite(const std::string& name, const std::vector<std::pair<std::string, std::string>>& files,
+    void suite(const std::string& name,
+               const std::vector<std::pair<std::string, std::string>>& files,
                const std::string* messages = nullptr, const std::string* listing = nullptr) const {
         fs::create_directories(root.path() / name / "expected");
         for (const auto& [file, content] : files)
@@ -127,8 +128,8 @@ TEST_F(ItfCheckTest, CountsSuitesEachWithItsOwnFilesAndMessages) {
     for (std::string line; std::getline(lines, line);)
         if (line.rfind("PASS: ", 0) == 0 || line.rfind("FAIL: ", 0) == 0)
             verdicts.push_back(line);
-    EXPECT_EQ(verdicts, (std::vector<std::string>{"PASS: one", "PASS: two", "FAIL: stale",
-                                                  "PASS: three"}));
+    EXPECT_EQ(verdicts,
+              (std::vector<std::string>{"PASS: one", "PASS: two", "FAIL: stale", "PASS: three"}));
     EXPECT_TRUE(r.out.ends_with("\n3 passed, 1 failed\n")) << r.out;
 }
 

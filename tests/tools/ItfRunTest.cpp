@@ -183,7 +183,8 @@ TEST(ItfRunTest, JsonCarriesTheICodeAsData) {
 
     // No ICode after a syntax error, but still the object with its list.
     dir.write("b.itf", "int f() { x = ; }\n");
-    auto failed = nlohmann::json::parse(runCommand(itfRun("--format json " + dir.path().string())).out);
+    auto failed =
+        nlohmann::json::parse(runCommand(itfRun("--format json " + dir.path().string())).out);
     EXPECT_EQ(failed["icode"], nlohmann::json::parse(R"({"files": []})"));
 }
 

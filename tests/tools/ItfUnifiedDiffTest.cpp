@@ -33,19 +33,19 @@ TEST(ItfUnifiedDiffTest, EqualTextsHaveNoDiff) {
 TEST(ItfUnifiedDiffTest, OneChangedLineWithThreeLinesOfContext) {
     std::vector<std::string> after = numbered(1, 9);
     after[4] = "line five";
-    EXPECT_EQ(itfUnifiedDiff(lines(numbered(1, 9)), lines(after), "s/expected/messages.txt",
-                             "actual"),
-              "--- s/expected/messages.txt\n"
-              "+++ actual\n"
-              "@@ -2,7 +2,7 @@\n"
-              " line 2\n"
-              " line 3\n"
-              " line 4\n"
-              "-line 5\n"
-              "+line five\n"
-              " line 6\n"
-              " line 7\n"
-              " line 8\n");
+    EXPECT_EQ(
+        itfUnifiedDiff(lines(numbered(1, 9)), lines(after), "s/expected/messages.txt", "actual"),
+        "--- s/expected/messages.txt\n"
+        "+++ actual\n"
+        "@@ -2,7 +2,7 @@\n"
+        " line 2\n"
+        " line 3\n"
+        " line 4\n"
+        "-line 5\n"
+        "+line five\n"
+        " line 6\n"
+        " line 7\n"
+        " line 8\n");
 }
 
 struct HunkCase {
@@ -57,11 +57,11 @@ struct HunkCase {
 
 TEST(ItfUnifiedDiffTest, HunkHeadersAndShapes) {
     std::vector<std::string> sixApart = numbered(1, 12);
-    sixApart[1] = "x";  // line 2
-    sixApart[8] = "y";  // line 9: six unchanged lines between, contexts touch
+    sixApart[1] = "x"; // line 2
+    sixApart[8] = "y"; // line 9: six unchanged lines between, contexts touch
     std::vector<std::string> sevenApart = numbered(1, 13);
-    sevenApart[1] = "x";  // line 2
-    sevenApart[9] = "y";  // line 10: seven unchanged lines between, two hunks
+    sevenApart[1] = "x"; // line 2
+    sevenApart[9] = "y"; // line 10: seven unchanged lines between, two hunks
     const HunkCase cases[] = {
         {"into an empty text", "", "a\nb\n", "@@ -0,0 +1,2 @@\n+a\n+b\n"},
         {"everything removed", "a\n", "", "@@ -1 +0,0 @@\n-a\n"},
@@ -97,8 +97,8 @@ std::size_t lcsLength(const std::vector<std::string>& a, const std::vector<std::
     std::vector<std::vector<std::size_t>> t(a.size() + 1, std::vector<std::size_t>(b.size() + 1));
     for (std::size_t i = 1; i <= a.size(); ++i)
         for (std::size_t j = 1; j <= b.size(); ++j)
-            t[i][j] = a[i - 1] == b[j - 1] ? t[i - 1][j - 1] + 1
-                                           : std::max(t[i - 1][j], t[i][j - 1]);
+            t[i][j] =
+                a[i - 1] == b[j - 1] ? t[i - 1][j - 1] + 1 : std::max(t[i - 1][j], t[i][j - 1]);
     return t[a.size()][b.size()];
 }
 

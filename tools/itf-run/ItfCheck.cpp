@@ -115,8 +115,8 @@ std::string expectedMessagesText(const ItfSuiteRun& run) {
            "\n";
 }
 
-int runCheck(const ItfCheckRequest& request, const KsCHostConfig& defaultConfig,
-             std::FILE* out, std::FILE* err) {
+int runCheck(const ItfCheckRequest& request, const KsCHostConfig& defaultConfig, std::FILE* out,
+             std::FILE* err) {
     constexpr int kUsageError = 2;
     std::vector<Suite> suites;
     if (request.suites.empty()) {
@@ -153,8 +153,8 @@ int runCheck(const ItfCheckRequest& request, const KsCHostConfig& defaultConfig,
             }
             continue;
         }
-        std::string report = compare(suite, kMessagesFile, messages) +
-                             compare(suite, kListingFile, run.listing);
+        std::string report =
+            compare(suite, kMessagesFile, messages) + compare(suite, kListingFile, run.listing);
         // Every block must come back: a leak fails the suite as a wrong message would.
         if (!leak.empty())
             report += leak + "\n";

@@ -17,8 +17,8 @@ struct ItfCheckRequest {
 // Runs each suite with its own host.json or `defaultConfig`, reports on `out` (diffs, the
 // closing count, "updated DIR") and on `err` (usage errors). Returns the exit status: 0 all
 // passed or were written, 1 a suite failed, 2 a usage error before any suite ran.
-int runCheck(const ItfCheckRequest& request, const KsCHostConfig& defaultConfig,
-             std::FILE* out, std::FILE* err);
+int runCheck(const ItfCheckRequest& request, const KsCHostConfig& defaultConfig, std::FILE* out,
+             std::FILE* err);
 
 // The messages file's content for a run: the message lines, then "result: true|false".
 std::string expectedMessagesText(const ItfSuiteRun& run);

@@ -107,8 +107,8 @@ private:
                 }
             }
             for (long c = -d; c <= d; c += 2) {
-                long px = (c == -d || (c != d && r(c + 1) - 1 < r(c - 1))) ? r(c + 1) - 1
-                                                                            : r(c - 1);
+                long px =
+                    (c == -d || (c != d && r(c + 1) - 1 < r(c - 1))) ? r(c + 1) - 1 : r(c - 1);
                 long k = c + delta;
                 long py = px - k;
                 while (px > 0 && py > 0 && a[px - 1] == b[py - 1])
