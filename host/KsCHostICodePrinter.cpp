@@ -97,17 +97,32 @@ bool isDefined(const KsCHostCodeModel& model, const KsCHostParamSymbol& function
     return model.codeBlockDB().hasCodeBlock(&function);
 }
 
+// The file whose table a symbol entered first, when that is not `table`: a symbol listed in
+// several tables is shown in full in its own file and as a reference elsewhere.
+const KsCHostFile* homeElsewhere(const KsCHostSymbolData& symbol, const KsCHostSymbolTable& table) {
+    const KsCSymbolTable* home = symbol.firstTable();
+    if (!home || home == &table)
+        return nullptr;
+    KsCIcFileId* file = home->getFile();
+    return file ? dynamic_cast<const KsCHostFile*>(file->getFile()) : nullptr;
+}
+
 // ---------------------------------------------------------------------------------------------
 // JSON
 
 class JsonValue {
 public:
-    enum class Kind { Null, Number, String, Array, Object };
+    enum class Kind { Null, Boolean, Number, String, Array, Object };
 
     JsonValue() = default;
     static JsonValue num(double value) {
         JsonValue v(Kind::Number);
         v.number_ = value;
+        return v;
+    }
+    static JsonValue boolean(bool value) {
+        JsonValue v(Kind::Boolean);
+        v.number_ = value ? 1 : 0;
         return v;
     }
     static JsonValue str(std::string text) {
@@ -132,6 +147,9 @@ public:
         switch (kind_) {
         case Kind::Null:
             out += "null";
+            return;
+        case Kind::Boolean:
+            out += number_ != 0 ? "true" : "false";
             return;
         case Kind::Number:
             out += std::isfinite(number_) ? number(number_) : "null";
@@ -249,13 +267,24 @@ JsonValue jsonSymbol(const KsCHostSymbolData& symbol) {
     }
     if (symbol.hasSmbKind())
         value.set("smbKind", JsonValue::str(smbKindWord(symbol.smbKind())));
-    std::vector<std::string> marks = markWords(symbol);
-    if (!marks.empty()) {
-        JsonValue array = JsonValue::array();
-        for (std::string& mark : marks)
-            array.add(JsonValue::str(std::move(mark)));
-        value.set("marks", std::move(array));
+    // The marks set, and apart from them the marks cleared explicitly.
+    JsonValue marks = JsonValue::array();
+    JsonValue unmarked = JsonValue::array();
+    bool anyMarked = false, anyUnmarked = false;
+    for (int m = 0; m < KS_HOST_MARK_COUNT; ++m) {
+        auto mark = static_cast<KsEHostMark>(m);
+        if (symbol.mark(mark) == KsEHostMarkState::Marked) {
+            marks.add(JsonValue::str(KsCHostSymbolData::markName(mark)));
+            anyMarked = true;
+        } else if (symbol.mark(mark) == KsEHostMarkState::Unmarked) {
+            unmarked.add(JsonValue::str(KsCHostSymbolData::markName(mark)));
+            anyUnmarked = true;
+        }
     }
+    if (anyMarked)
+        value.set("marks", std::move(marks));
+    if (anyUnmarked)
+        value.set("unmarked", std::move(unmarked));
     if (!symbol.definition().empty())
         value.set("definition", JsonValue::str(symbol.definition()));
     if (!symbol.comment().empty())
@@ -271,34 +300,44 @@ JsonValue jsonSymbol(const KsCHostSymbolData& symbol) {
     return value;
 }
 
+// A member of `table`, with the file it belongs to when that is another one.
+JsonValue jsonMember(const KsCHostSymbolData& symbol, const KsCHostSymbolTable& table) {
+    JsonValue value = jsonSymbol(symbol);
+    if (const KsCHostFile* home = homeElsewhere(symbol, table))
+        value.set("from", JsonValue::str(home->name()));
+    return value;
+}
+
 JsonValue jsonSymbols(const KsCHostSymbolTable& table) {
     JsonValue array = JsonValue::array();
     for (KsCSymbol* member : table.getMembers())
         if (const KsCHostSymbolData* symbol = KsCHostSymbolData::of(member))
-            array.add(jsonSymbol(*symbol));
+            array.add(jsonMember(*symbol, table));
     return array;
 }
 
-JsonValue jsonFunction(const KsCHostCodeModel& model, const KsCHostParamSymbol& function) {
-    JsonValue value = jsonSymbol(function);
+// Every function has a body; it holds the function's symbols in the function's own file only.
+JsonValue jsonFunction(const KsCHostCodeModel& model, const KsCHostParamSymbol& function,
+                       const KsCHostSymbolTable& table) {
+    JsonValue value = jsonMember(function, table);
     if (function.externClassSet()) {
         auto* smbClass = dynamic_cast<const KsCHostSmbClass*>(function.externClass());
         value.set("externClass", smbClass ? JsonValue::str(smbClass->name()) : JsonValue());
     }
     if (function.externStateSet())
         value.set("externState", JsonValue::num(function.externState()));
+    value.set("defined", JsonValue::boolean(isDefined(model, function)));
     JsonValue parameters = JsonValue::array();
     for (KsCUnparamSymbol* parameter : function.parameters())
         if (const KsCHostSymbolData* p = KsCHostSymbolData::of(parameter))
             parameters.add(jsonSymbol(*p));
     value.set("parameters", std::move(parameters));
-    if (isDefined(model, function)) {
-        JsonValue body = JsonValue::object();
-        body.set("symbols", jsonSymbols(function.body().symbols()));
-        // Statements of the body join here once the model holds them.
-        body.set("statements", JsonValue::array());
-        value.set("body", std::move(body));
-    }
+    JsonValue body = JsonValue::object();
+    body.set("symbols", homeElsewhere(function, table) ? JsonValue::array()
+                                                       : jsonSymbols(function.body().symbols()));
+    // Statements of the body join here once the model holds them.
+    body.set("statements", JsonValue::array());
+    value.set("body", std::move(body));
     return value;
 }
 
@@ -361,7 +400,7 @@ std::string quotedText(const std::string& text) {
     return "\"" + text + "\"";
 }
 
-std::string comment(const KsCHostSymbolData& symbol) {
+std::string comment(const KsCHostSymbolData& symbol, const KsCHostFile* home = nullptr) {
     const KsCHostSmbClass* smbClass = symbol.smbClass();
     std::string text = std::string(listingKindWord(symbol.listingKind())) + ", class " +
                        (smbClass ? smbClass->name() : "-") + ", scaling " + scalingText(symbol) +
@@ -391,6 +430,8 @@ std::string comment(const KsCHostSymbolData& symbol) {
         if (function->externStateSet())
             text += ", extern state " + std::to_string(function->externState());
     }
+    if (home)
+        text += ", from " + home->name();
     return "  /* " + text + " */";
 }
 
@@ -424,36 +465,39 @@ private:
 
     void printMembers(const KsCHostSymbolTable& table, int indent) {
         for (KsCSymbol* member : table.getMembers()) {
+            const KsCHostSymbolData* data = KsCHostSymbolData::of(member);
+            const KsCHostFile* home = data ? homeElsewhere(*data, table) : nullptr;
             if (auto* function = dynamic_cast<const KsCHostParamSymbol*>(member))
-                printFunction(*function, indent);
+                printFunction(*function, indent, home);
             else if (auto* variable = dynamic_cast<const KsCHostUnparamSymbol*>(member))
-                printVariable(*variable, variable->name(), indent);
+                printVariable(*variable, variable->name(), indent, home);
         }
     }
 
     void printVariable(const KsCHostUnparamSymbol& symbol, const std::string& qualifiedName,
-                       int indent) {
+                       int indent, const KsCHostFile* home = nullptr) {
         out_ += std::string(static_cast<std::size_t>(indent), ' ') +
                 declaration(symbol.hostType(), qualifiedName);
         if (symbol.hasInit())
             out_ += " = " + values(symbol.initValues(), symbol.valueRows(), symbol.valueColumns(),
                                    isArray(symbol));
-        out_ += ";" + comment(symbol) + "\n";
+        out_ += ";" + comment(symbol, home) + "\n";
         for (int i = 0; i < symbol.getNrOfComponents(); ++i)
             if (auto* c = dynamic_cast<const KsCHostUnparamSymbol*>(symbol.getComponent(i)))
                 printVariable(*c, qualifiedName + "." + c->name(), indent + 2);
     }
 
-    void printFunction(const KsCHostParamSymbol& function, int indent) {
+    // The body is shown in the function's own file; elsewhere the function reads as declared.
+    void printFunction(const KsCHostParamSymbol& function, int indent, const KsCHostFile* home) {
         std::string margin(static_cast<std::size_t>(indent), ' ');
-        bool defined = isDefined(model_, function);
+        bool defined = !home && isDefined(model_, function);
         std::string end = defined ? "" : ";";
         std::string head = margin + declaration(function.hostType(), function.name()) + "(";
         const auto& parameters = function.parameters();
         if (parameters.empty()) {
-            out_ += head + "void)" + end + comment(function) + "\n";
+            out_ += head + "void)" + end + comment(function, home) + "\n";
         } else {
-            out_ += head + comment(function) + "\n";
+            out_ += head + comment(function, home) + "\n";
             for (std::size_t i = 0; i < parameters.size(); ++i) {
                 const KsCHostSymbolData* p = KsCHostSymbolData::of(parameters[i]);
                 if (!p)
@@ -490,9 +534,9 @@ std::string KsCHostICodePrinter::json(const KsCHostCodeModel& model) {
         JsonValue functions = JsonValue::array();
         for (KsCSymbol* member : file->table().symbols().getMembers()) {
             if (auto* function = dynamic_cast<const KsCHostParamSymbol*>(member))
-                functions.add(jsonFunction(model, *function));
+                functions.add(jsonFunction(model, *function, file->table().symbols()));
             else if (const KsCHostSymbolData* symbol = KsCHostSymbolData::of(member))
-                symbols.add(jsonSymbol(*symbol));
+                symbols.add(jsonMember(*symbol, file->table().symbols()));
         }
         JsonValue entry = JsonValue::object();
         entry.set("name", JsonValue::str(file->name()));

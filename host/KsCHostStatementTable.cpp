@@ -36,6 +36,8 @@ bool KsCHostSymbolTable::removeMember(KsCSymbol* symbol) {
         if (named->second.empty())
             byName_.erase(named);
     }
+    if (auto* data = KsCHostSymbolData::of(symbol))
+        data->leftTable(this);
     return true;
 }
 

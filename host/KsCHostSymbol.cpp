@@ -45,6 +45,11 @@ void KsCHostSymbolData::enteredInto(KsCSymbolTable* table) {
         table_ = table;
 }
 
+void KsCHostSymbolData::leftTable(KsCSymbolTable* table) {
+    if (table_ == table)
+        table_ = nullptr;
+}
+
 const char* KsCHostSymbolData::markName(KsEHostMark mark) {
     switch (mark) {
     case KS_HOST_MARK_ROOT_INTERFACE:

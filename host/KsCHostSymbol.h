@@ -55,6 +55,8 @@ public:
     KsCSrcRef* srcRef() const { return srcRef_; }
     KsCSymbolTable* firstTable() const { return table_; }
     void enteredInto(KsCSymbolTable* table);
+    // A symbol taken out of its first table has none until it enters the next.
+    void leftTable(KsCSymbolTable* table);
 
     bool hasSmbKind() const { return hasSmbKind_; }
     SMB_SymbolKind smbKind() const { return smbKind_; }

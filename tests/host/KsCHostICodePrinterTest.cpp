@@ -152,7 +152,7 @@ TEST_F(KsCHostICodePrinterTest, TheJsonHoldsTheSameContent) {
       "name": "ctl.c",
       "kind": "c",
       "symbols": [
-        {"name": "setpoint", "kind": "variable", "type": "sint16", "class": "GlobalVar", "scaling": {"name": "DEFAULT_SCALING"}, "flags": 2097152, "min": -100, "max": 100, "smbKind": "SMB_VARIABLE", "marks": ["IsRootInterface", "!IsSfEntryVar"]},
+        {"name": "setpoint", "kind": "variable", "type": "sint16", "class": "GlobalVar", "scaling": {"name": "DEFAULT_SCALING"}, "flags": 2097152, "min": -100, "max": 100, "smbKind": "SMB_VARIABLE", "marks": ["IsRootInterface"], "unmarked": ["IsSfEntryVar"]},
         {"name": "samples", "kind": "variable", "type": "sint16[3]", "class": "GlobalVar", "scaling": {"lsb": 1, "offset": 0}, "flags": 2097152, "init": [0, 1.5, -2]},
         {"name": "m", "kind": "variable", "type": "uint8[2][2]", "class": "StaticGlobalVar", "scaling": {"lsb": [1, 0.5, 0.25, 0.125], "offset": [0, 0, 0, 10]}, "flags": 1, "init": [1, 2, 3, 4]},
         {"name": "p", "kind": "variable", "type": "float32*", "class": "GlobalVar", "scaling": {"lsb": 0.1, "offset": -5}, "flags": 2097152},
@@ -166,6 +166,7 @@ TEST_F(KsCHostICodePrinterTest, TheJsonHoldsTheSameContent) {
           "class": "StdFunction",
           "scaling": {"name": "DEFAULT_SCALING"},
           "flags": 2097152,
+          "defined": true,
           "parameters": [
             {"name": "value", "kind": "parameter", "type": "sint16", "class": "InputParam", "scaling": {"name": "DEFAULT_SCALING"}, "flags": 2097152},
             {"name": "bound", "kind": "parameter", "type": "sint16*", "class": "OutputParam", "scaling": {"name": "DEFAULT_SCALING"}, "flags": 2097152, "marks": ["IsConversionTempVar"]}
@@ -177,8 +178,8 @@ TEST_F(KsCHostICodePrinterTest, TheJsonHoldsTheSameContent) {
             "statements": []
           }
         },
-        {"name": "step", "kind": "function", "type": "void", "class": "StdFunction", "scaling": {"name": "DEFAULT_VOID_SCALING"}, "flags": 2097152, "parameters": []},
-        {"name": "init", "kind": "function", "type": "void", "class": "StaticFunction", "scaling": {"name": "DEFAULT_VOID_SCALING"}, "flags": 2097152, "parameters": [], "body": {"symbols": [], "statements": []}},
+        {"name": "step", "kind": "function", "type": "void", "class": "StdFunction", "scaling": {"name": "DEFAULT_VOID_SCALING"}, "flags": 2097152, "defined": false, "parameters": [], "body": {"symbols": [], "statements": []}},
+        {"name": "init", "kind": "function", "type": "void", "class": "StaticFunction", "scaling": {"name": "DEFAULT_VOID_SCALING"}, "flags": 2097152, "defined": true, "parameters": [], "body": {"symbols": [], "statements": []}},
         {
           "name": "SQUARE",
           "kind": "paramMacro",
@@ -186,9 +187,11 @@ TEST_F(KsCHostICodePrinterTest, TheJsonHoldsTheSameContent) {
           "class": "MacroFunction",
           "scaling": {"name": "DEFAULT_SCALING"},
           "flags": 2097152,
+          "defined": false,
           "parameters": [
             {"name": "x", "kind": "parameter", "type": "sint16", "class": "InputParam", "scaling": {"name": "DEFAULT_SCALING"}, "flags": 2097152}
-          ]
+          ],
+          "body": {"symbols": [], "statements": []}
         }
       ]
     },
@@ -197,7 +200,7 @@ TEST_F(KsCHostICodePrinterTest, TheJsonHoldsTheSameContent) {
       "kind": "header",
       "symbols": [],
       "functions": [
-        {"name": "MDL_tick", "kind": "function", "type": "void", "class": "StdFunction", "scaling": {"name": "DEFAULT_VOID_SCALING"}, "flags": 2097152, "externClass": null, "externState": 0, "parameters": []}
+        {"name": "MDL_tick", "kind": "function", "type": "void", "class": "StdFunction", "scaling": {"name": "DEFAULT_VOID_SCALING"}, "flags": 2097152, "externClass": null, "externState": 0, "defined": false, "parameters": [], "body": {"symbols": [], "statements": []}}
       ]
     },
     {"name": "znfxp.c", "kind": "library", "symbols": [], "functions": []},

@@ -257,19 +257,22 @@ TEST_F(KsCHostSymbolTest, SymbolTablesIndexTheirMembersByName) {
     EXPECT_EQ(table->findMembers("x"), nullptr);
 }
 
-TEST_F(KsCHostSymbolTest, ASymbolKeepsTheTableItEnteredFirst) {
+TEST_F(KsCHostSymbolTest, ASymbolBelongsToTheTableItEnteredFirstUntilItLeavesIt) {
     KsCIcFile* a = file("a")->getFile();
     KsCSymbolTable* own = a->getStt()->getSymbolTable();
     KsCSymbolTable* header = a->getAssociatedCHeader()->getFile()->getStt()->getSymbolTable();
     KsCParamSymbol* f = function(file("a"), "f");
     EXPECT_EQ(f->getSymbolTable(), own);
-    // Handed over to the header, as model functions are.
+    // Handed over to the header, as model functions are: the header is its table now, and
+    // entering it into its old table again keeps it there.
     EXPECT_TRUE(own->removeMember(f));
+    EXPECT_EQ(f->getSymbolTable(), nullptr);
     header->addMember(f);
-    EXPECT_EQ(f->getSymbolTable(), own);
-    EXPECT_EQ(f->getSymbolTable()->getFile()->getFile(), a);
+    own->addMember(f);
+    EXPECT_EQ(f->getSymbolTable(), header);
     EXPECT_EQ(names(header->getMembers()), std::vector<std::string>{"f"});
-    EXPECT_TRUE(own->getMembers().empty());
+    EXPECT_EQ(names(own->getMembers()), std::vector<std::string>{"f"});
+    EXPECT_FALSE(header->removeMember(nullptr));
 }
 
 TEST_F(KsCHostSymbolTest, AFunctionsTablesNestLocalsInParametersInTheFile) {
