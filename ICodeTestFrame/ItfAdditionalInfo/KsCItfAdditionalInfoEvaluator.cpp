@@ -291,8 +291,9 @@ bool KsCItfAdditionalInfoEvaluator::collectSymbolIdentifier(const ZnCXString& na
         found.smbKind = kind;
     } else if (is(name, "SCALE")) {
         KS_Scaling* scaling = nullptr;
+        // A scaling the host does not know must not end the run without a word.
         if (!parseScaling(value, scaling))
-            return false;
+            return reject(position, "Invalid symbol info: Unknown value for SCALE: " + value);
         found.scale = scaling;
     } else {
         // Whether the name is known is decided after the checks of phase 2.
@@ -519,7 +520,7 @@ bool KsCItfAdditionalInfoEvaluator::collectOperationProperties(
             } else if (is(name, "SCALE")) {
                 KS_Scaling* scaling = nullptr;
                 if (!parseScaling(value, scaling))
-                    return false;
+                    return reject(position, kind.unknownValue + value);
                 found.scale = scaling;
             } else {
                 return reject(position, kind.unknownProperty + name);

@@ -525,12 +525,19 @@ TEST_F(KsCItfAdditionalInfoEvaluatorTest, ScaleNamesADefaultScalingOrADataDictio
     EXPECT_EQ(argument.getScaling(), scaling);
     EXPECT_TRUE(symbol.isScalingDefined() && operation.isScalingDefined());
 
-    // No such key: the evaluation fails without a message of the evaluator.
+    // No such key: parseScaling only fails; the annotation says which value it did not know.
     EXPECT_FALSE(evaluator.parseScaling("NO_SUCH_KEY", scaling));
     EXPECT_EQ(scaling, nullptr);
+    EXPECT_TRUE(messages().empty());
     for (Kind kind : {Kind::Smb, Kind::Op, Kind::Arg})
         EXPECT_FALSE(evaluate(kind, "SCALE = NO_SUCH_KEY"));
-    EXPECT_TRUE(messages().empty());
+    ASSERT_EQ(texts().size(), 3u);
+    EXPECT_TRUE(texts()[0].ends_with(": Invalid symbol info: Unknown value for SCALE: NO_SUCH_KEY"))
+        << texts()[0];
+    EXPECT_TRUE(texts()[1].ends_with(": Unknown value in operation info: NO_SUCH_KEY"))
+        << texts()[1];
+    EXPECT_TRUE(texts()[2].ends_with(": Unknown value in argument info: NO_SUCH_KEY"))
+        << texts()[2];
 }
 
 TEST_F(KsCItfAdditionalInfoEvaluatorTest, OperationAndArgumentValues) {
