@@ -4,10 +4,13 @@
 
 #include "KS_DataTypeServer.h"
 #include "KS_ExprDescr.h"
+#include "KS_ExprLocation.h"
 #include "KS_Files.h"
 #include "KS_IterContext.h"
+#include "KS_Operations.h"
 #include "KS_ScaleServer.h"
 #include "KS_StatementTables.h"
+#include "KS_Statements.h"
 #include "KS_SymbolClasses.h"
 #include "KS_SymbolDB.h"
 #include "KS_Symbols.h"
@@ -15,28 +18,16 @@
 
 class KsCSrcRefServer;
 
-// Services whose operations the module calls through components still to come; each is a host object
-// the container hands out once.
+// Factories the module receives and hands on without calling them; each is a host object the
+// container hands out once.
 #define KS_HOST_SERVICE(Name)                                                                      \
     class KS_HOST_API Name {                                                                       \
     public:                                                                                        \
         virtual ~Name();                                                                           \
     };
-KS_HOST_SERVICE(KS_RangeServer)
 KS_HOST_SERVICE(KS_ArithmeticOpFactory)
-KS_HOST_SERVICE(KsCOpBaseFactory)
 KS_HOST_SERVICE(KS_BitOpFactory)
 KS_HOST_SERVICE(KS_ControlFlowOpFactory)
-KS_HOST_SERVICE(KsCLoopOpFactory)
-KS_HOST_SERVICE(KS_QSOBaseFactory)
-KS_HOST_SERVICE(KS_QSORefFactory)
-KS_HOST_SERVICE(KS_QSODerefFactory)
-KS_HOST_SERVICE(KS_QSOVectorSliceBaseFactory)
-KS_HOST_SERVICE(KS_StdCFunctionCallFactory)
-KS_HOST_SERVICE(KsCStatementFactory)
-KS_HOST_SERVICE(KS_OpOperatorServer)
-KS_HOST_SERVICE(KS_ExprLocFactory)
-KS_HOST_SERVICE(KsCStmTableFactory)
 #undef KS_HOST_SERVICE
 
 class KS_HOST_API KS_SymbolServer {

@@ -20,6 +20,12 @@ public:
     virtual bool isUnsignedInteger() const = 0;
     // Bits of one value (of one element for vectors and matrices); 0 for void and structs.
     virtual int getBitWidth() const = 0;
+    // The type itself when it is an integer, floating or boolean type (typedefs of them
+    // included); null for void, pointers, vectors, matrices and structures.
+    virtual KS_DataType* getNumericalType() = 0;
+    // The smallest and largest value of a numerical type; 0 for other types.
+    virtual double getLowerLimit() const = 0;
+    virtual double getUpperLimit() const = 0;
 };
 
 // The dimensions of a type looked up by name; empty for scalars.
@@ -57,8 +63,8 @@ public:
     virtual KS_DataType* getInt16() = 0;
     virtual KS_DataType* getInt32() = 0;
     virtual KS_DataType* getInt64() = 0;
-    // The integer type of the target's native width.
-    virtual KS_DataType* getIntRepresentation() = 0;
+    // The integer type of the target's native width, signed or unsigned.
+    virtual KS_DataType* getIntRepresentation(bool isSigned) = 0;
 };
 
 class KS_HOST_API KS_PointerTypeServer {

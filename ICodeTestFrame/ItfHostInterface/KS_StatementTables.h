@@ -9,6 +9,8 @@
 
 class KsCSymbol;
 class KsCParamSymbol;
+class KS_Statement;
+class KsCLoopOperation;
 class KsCIcFileId;
 class KS_StatementTable;
 
@@ -34,10 +36,19 @@ public:
     // Null for a file's table.
     virtual KS_StatementTable* getParentStatementTable() const = 0;
     virtual KsCSymbolTable* getSymbolTable() const = 0;
+    // The loop whose body the table is; null for every other table.
+    virtual KsCLoopOperation* getLoopOperation() const = 0;
 };
 
-// The statement table of a function body or a nested code block.
-class KS_HOST_API KsCCodeStmTable : public KS_StatementTable {};
+// The statement table of a function body, a nested code block, a branch, a case or a loop
+// body: its statements in order.
+class KS_HOST_API KsCCodeStmTable : public KS_StatementTable {
+public:
+    // The last statement; the table's own head when it holds none.
+    virtual KS_Statement* getOutputTail() = 0;
+    // Inserts `statement` right behind `tail`, a statement of this table or its head.
+    virtual void insertBehind(KS_Statement* tail, KS_Statement* statement) = 0;
+};
 
 class KS_HOST_API KsCCodeBlockDB {
 public:
