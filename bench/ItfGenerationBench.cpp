@@ -2,6 +2,7 @@
 // grows with the suite and with the size of the host's configuration.
 #include "ItfControl/KsCItfControl.h"
 #include "ItfDeclarationSuite.h"
+#include "ItfSuiteGenerator.h"
 #include "KsCHostCodeModel.h"
 #include "KsCHostConfig.h"
 #include "KsCHostMemController.h"
@@ -97,6 +98,50 @@ void BM_GenerateDoubleSuite(benchmark::State& state) {
     runSuite(state, 2 * kBlocksPerFile, 0, 2 * kFiles * kBlocksPerFile * kDdPerBlock);
 }
 
+// Whole runs over the suite of every construct (statements and expressions included), and over
+// twice that suite.
+const std::filesystem::path& constructFolder(int files) {
+    static std::map<int, std::filesystem::path> folders;
+    auto& folder = folders[files];
+    if (folder.empty()) {
+        folder = std::filesystem::temp_directory_path() /
+                 ("itf-bench-" + std::to_string(::getpid()) + "-all-" + std::to_string(files));
+        std::filesystem::create_directories(folder);
+        for (const auto& file : generateSuite(files, 2000))
+            std::ofstream(folder / file.name, std::ios::binary) << file.text;
+    }
+    return folder;
+}
+
+void runConstructs(benchmark::State& state, int files) {
+    const auto previous = std::filesystem::current_path();
+    std::filesystem::current_path(constructFolder(files));
+    KsCHostMemController memory;
+    pKSMemory = &memory;
+    KsCHostMessageServer::setScannerOutput(nullptr);
+    const KsCHostConfig hostConfig = KsCHostConfig::embeddedDefault();
+    for (auto _ : state)
+        if (!wholeRun(hostConfig)) {
+            state.SkipWithError(KsCHostMessageServer::instance().messages().empty()
+                                    ? "the run failed"
+                                    : KsCHostMessageServer::instance().messages()[0].text.c_str());
+            break;
+        }
+    pKSMemory = nullptr;
+    std::filesystem::current_path(previous);
+    state.counters["module_peak_MiB"] =
+        static_cast<double>(memory.peakBytes()) / (1024.0 * 1024.0);
+}
+
+void BM_WholeRunConstructs(benchmark::State& state) {
+    runConstructs(state, 5);
+}
+void BM_WholeRunDoubleConstructs(benchmark::State& state) {
+    runConstructs(state, 10);
+}
+
+BENCHMARK(BM_WholeRunConstructs)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_WholeRunDoubleConstructs)->Unit(benchmark::kMillisecond);
 BENCHMARK(BM_GenerateDefaultConfig)->Unit(benchmark::kMillisecond);
 BENCHMARK(BM_GenerateLargeConfig)->Unit(benchmark::kMillisecond);
 BENCHMARK(BM_GenerateDoubleSuite)->Unit(benchmark::kMillisecond);

@@ -33,20 +33,14 @@ KsCHostCodeModel::KsCHostCodeModel(const KsCHostConfig& config)
       functionSymbols_(symbolDB_, variableSymbols_), paramMacroSymbols_(functionSymbols_),
       exprDescrServer_(config_, dataTypeServer_, classServer_, scaleServer_, symbolDB_,
                        applicationServer_),
-      rangeServer_(std::make_unique<KS_RangeServer>()),
-      stdCFcnCallFactory_(std::make_unique<KS_StdCFunctionCallFactory>()),
-      statementFactory_(std::make_unique<KsCStatementFactory>()),
-      opOperatorServer_(std::make_unique<KS_OpOperatorServer>()),
-      exprLocFactory_(std::make_unique<KS_ExprLocFactory>()),
-      stmTableFactory_(std::make_unique<KsCStmTableFactory>()),
+      exprLocFactory_(icode_, dataTypeServer_, scaleServer_), stmTableFactory_(icode_),
+      statementFactory_(icode_), loopOps_(icode_), baseOps_(icode_),
+      accessMaker_(icode_, dataTypeServer_, scaleServer_), qsoBase_(accessMaker_),
+      qsoRef_(accessMaker_), qsoDeref_(accessMaker_), qsoVectorSlice_(accessMaker_),
+      stdCFcnCallFactory_(icode_, dataTypeServer_, scaleServer_),
       arithmetics_(std::make_unique<KS_ArithmeticOpFactory>()),
-      baseOps_(std::make_unique<KsCOpBaseFactory>()), bitOps_(std::make_unique<KS_BitOpFactory>()),
-      controlFlowOps_(std::make_unique<KS_ControlFlowOpFactory>()),
-      loopOps_(std::make_unique<KsCLoopOpFactory>()),
-      qsoBase_(std::make_unique<KS_QSOBaseFactory>()),
-      qsoRef_(std::make_unique<KS_QSORefFactory>()),
-      qsoDeref_(std::make_unique<KS_QSODerefFactory>()),
-      qsoVectorSlice_(std::make_unique<KS_QSOVectorSliceBaseFactory>()) {
+      bitOps_(std::make_unique<KS_BitOpFactory>()),
+      controlFlowOps_(std::make_unique<KS_ControlFlowOpFactory>()) {
     // A configuration that parse accepted makes every type; one built by hand may leave some
     // out, and what needs them is skipped.
     std::string where, what;

@@ -11,9 +11,12 @@
 #include "KsCHostConfig.h"
 #include "KsCHostDataTypeServer.h"
 #include "KsCHostExprDescr.h"
+#include "KsCHostICodeStore.h"
 #include "KsCHostIterContext.h"
+#include "KsCHostOpFactories.h"
 #include "KsCHostScaleServer.h"
 #include "KsCHostSrcRefServer.h"
+#include "KsCHostStatementFactories.h"
 #include "KsCHostSymbolDB.h"
 #include "KsCHostSymbolServers.h"
 
@@ -49,6 +52,11 @@ public:
     KsCHostExprDescrServer& exprDescrServer() { return exprDescrServer_; }
     KsCHostVariableSymbolServer& variableSymbols() { return variableSymbols_; }
     KsCHostFunctionSymbolServer& functionSymbols() { return functionSymbols_; }
+    // The statements, operations and expression locations of the bodies.
+    KsCHostICodeStore& icode() { return icode_; }
+    KsCHostOpOperatorServer& operators() { return operators_; }
+    KsCHostRangeServer& ranges() { return ranges_; }
+    KsCHostQSOVectorSliceFactory& vectorSlices() { return qsoVectorSlice_; }
 
     const KsCHostDataTypeServer& dataTypeServer() const { return dataTypeServer_; }
     const KsCHostScaleServer& scaleServer() const { return scaleServer_; }
@@ -57,6 +65,9 @@ public:
     const KsCHostSymbolDB& symbolDB() const { return symbolDB_; }
     const KsCHostCodeBlockDB& codeBlockDB() const { return codeBlockDB_; }
     const KsCHostIterContextFactory& iterContexts() const { return iterContexts_; }
+    const KsCHostICodeStore& icode() const { return icode_; }
+    const KsCHostOpOperatorServer& operators() const { return operators_; }
+    const KsCHostRangeServer& ranges() const { return ranges_; }
 
     // KS_ICodeFactoryContainer
     KS_SymbolServer* getSymbolServer() override { return this; }
@@ -67,14 +78,14 @@ public:
     KS_FileServer* getFileServer() override { return &applicationServer_; }
     KsCSmbClassServer* getSmbClassServer() override { return &classServer_; }
     KsCVarClassServer* getVarClassServer() override { return &classServer_; }
-    KS_RangeServer* getRangeServer() override { return rangeServer_.get(); }
+    KS_RangeServer* getRangeServer() override { return &ranges_; }
     KS_OpFactories* getOpFactories() override { return this; }
     KS_QSOFactories* getQSOFactories() override { return this; }
-    KS_StdCFunctionCallFactory* getStdCFcnCallFac() override { return stdCFcnCallFactory_.get(); }
-    KsCStatementFactory* getStatementFactory() override { return statementFactory_.get(); }
-    KS_OpOperatorServer* getOpOperatorServer() override { return opOperatorServer_.get(); }
-    KS_ExprLocFactory* getExprLocFactory() override { return exprLocFactory_.get(); }
-    KsCStmTableFactory* getStatementTableFactory() override { return stmTableFactory_.get(); }
+    KS_StdCFunctionCallFactory* getStdCFcnCallFac() override { return &stdCFcnCallFactory_; }
+    KsCStatementFactory* getStatementFactory() override { return &statementFactory_; }
+    KS_OpOperatorServer* getOpOperatorServer() override { return &operators_; }
+    KS_ExprLocFactory* getExprLocFactory() override { return &exprLocFactory_; }
+    KsCStmTableFactory* getStatementTableFactory() override { return &stmTableFactory_; }
     KsCCvIterConFactory* getCvIterContextFactory() override { return &iterContexts_; }
 
     // KsCCodeViewData
@@ -93,18 +104,16 @@ public:
 
     // KS_OpFactories
     KS_ArithmeticOpFactory* getArithmetics() override { return arithmetics_.get(); }
-    KsCOpBaseFactory* getBase() override { return baseOps_.get(); }
+    KsCOpBaseFactory* getBase() override { return &baseOps_; }
     KS_BitOpFactory* getBit() override { return bitOps_.get(); }
     KS_ControlFlowOpFactory* getControlFlow() override { return controlFlowOps_.get(); }
-    KsCLoopOpFactory* getLoop() override { return loopOps_.get(); }
+    KsCLoopOpFactory* getLoop() override { return &loopOps_; }
 
     // KS_QSOFactories
-    KS_QSOBaseFactory* getBaseFactory() override { return qsoBase_.get(); }
-    KS_QSORefFactory* getRefFactory() override { return qsoRef_.get(); }
-    KS_QSODerefFactory* getDerefFactory() override { return qsoDeref_.get(); }
-    KS_QSOVectorSliceBaseFactory* getVectorSliceBaseFactory() override {
-        return qsoVectorSlice_.get();
-    }
+    KS_QSOBaseFactory* getBaseFactory() override { return &qsoBase_; }
+    KS_QSORefFactory* getRefFactory() override { return &qsoRef_; }
+    KS_QSODerefFactory* getDerefFactory() override { return &qsoDeref_; }
+    KS_QSOVectorSliceBaseFactory* getVectorSliceBaseFactory() override { return &qsoVectorSlice_; }
 
     const KsCHostConfig& config() const { return config_; }
 
@@ -126,20 +135,23 @@ private:
     KsCHostCodeBlockDB codeBlockDB_;
     KsCHostIterContextFactory iterContexts_;
     KsCHostExprDescrServer exprDescrServer_;
-    // Services whose operations arrive with later components.
-    std::unique_ptr<KS_RangeServer> rangeServer_;
-    std::unique_ptr<KS_StdCFunctionCallFactory> stdCFcnCallFactory_;
-    std::unique_ptr<KsCStatementFactory> statementFactory_;
-    std::unique_ptr<KS_OpOperatorServer> opOperatorServer_;
-    std::unique_ptr<KS_ExprLocFactory> exprLocFactory_;
-    std::unique_ptr<KsCStmTableFactory> stmTableFactory_;
+    // The bodies' ICode and the factories that make it; it refers to everything above.
+    KsCHostICodeStore icode_;
+    KsCHostOpOperatorServer operators_;
+    KsCHostRangeServer ranges_;
+    KsCHostExprLocFactory exprLocFactory_;
+    KsCHostStmTableFactory stmTableFactory_;
+    KsCHostStatementFactory statementFactory_;
+    KsCHostLoopOpFactory loopOps_;
+    KsCHostOpBaseFactory baseOps_;
+    KsCHostAccessMaker accessMaker_;
+    KsCHostQSOBaseFactory qsoBase_;
+    KsCHostQSORefFactory qsoRef_;
+    KsCHostQSODerefFactory qsoDeref_;
+    KsCHostQSOVectorSliceFactory qsoVectorSlice_;
+    KsCHostStdCFunctionCallFactory stdCFcnCallFactory_;
+    // Services the module hands on without calling them.
     std::unique_ptr<KS_ArithmeticOpFactory> arithmetics_;
-    std::unique_ptr<KsCOpBaseFactory> baseOps_;
     std::unique_ptr<KS_BitOpFactory> bitOps_;
     std::unique_ptr<KS_ControlFlowOpFactory> controlFlowOps_;
-    std::unique_ptr<KsCLoopOpFactory> loopOps_;
-    std::unique_ptr<KS_QSOBaseFactory> qsoBase_;
-    std::unique_ptr<KS_QSORefFactory> qsoRef_;
-    std::unique_ptr<KS_QSODerefFactory> qsoDeref_;
-    std::unique_ptr<KS_QSOVectorSliceBaseFactory> qsoVectorSlice_;
 };

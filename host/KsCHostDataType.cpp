@@ -39,6 +39,7 @@ bool KsCHostDataType::hasLimits() const {
     case Kind::Integer:
     case Kind::Float:
     case Kind::Bool:
+    case Kind::Undefined:
     case Kind::Pointer:
         return true;
     case Kind::Vector:
@@ -55,6 +56,8 @@ double KsCHostDataType::minValue() const {
         return signed_ ? -std::ldexp(1.0, bits_ - 1) : 0.0;
     case Kind::Float:
         return bits_ == 32 ? -static_cast<double>(FLT_MAX) : -DBL_MAX;
+    case Kind::Undefined:
+        return -std::ldexp(1.0, 63);
     case Kind::Vector:
     case Kind::Matrix:
         return element_->minValue();
@@ -71,6 +74,8 @@ double KsCHostDataType::maxValue() const {
         return bits_ == 32 ? static_cast<double>(FLT_MAX) : DBL_MAX;
     case Kind::Bool:
         return 1.0;
+    case Kind::Undefined:
+        return std::ldexp(1.0, 63) - 1.0;
     case Kind::Pointer:
         return std::ldexp(1.0, bits_) - 1.0;
     case Kind::Vector:

@@ -26,12 +26,21 @@ public:
     bool isSignedInteger() const override;
     bool isUnsignedInteger() const override;
     int getBitWidth() const override;
+    KS_DataType* getNumericalType() override { return isNumerical() ? this : nullptr; }
+    double getLowerLimit() const override { return isNumerical() ? minValue() : 0.0; }
+    double getUpperLimit() const override { return isNumerical() ? maxValue() : 0.0; }
 
     const std::string& name() const { return name_; }
     Kind kind() const { return kind_; }
+    int getDimensionCount() const override { return isVector() ? 1 : isMatrix() ? 2 : 0; }
     bool isVector() const { return kind_ == Kind::Vector; }
     bool isMatrix() const { return kind_ == Kind::Matrix; }
     bool isStruct() const { return kind_ == Kind::Struct; }
+    // Integer, floating, boolean and the undefined numerical type, typedefs of them included.
+    bool isNumerical() const {
+        return kind_ == Kind::Integer || kind_ == Kind::Float || kind_ == Kind::Bool ||
+               kind_ == Kind::Undefined;
+    }
     // The pointer's target, the vector's or matrix's element; null for other types.
     KsCHostDataType* element() const { return element_; }
     // A vector is 1 x width, a matrix rows x columns, anything else 1 x 1.
@@ -41,7 +50,8 @@ public:
     const std::vector<Component>& components() const { return components_; }
     // The dictionary path of a typedef; empty for other types.
     const std::string& ddPath() const { return ddPath_; }
-    // The smallest and largest value of one element; numerical types and pointers only.
+    // The smallest and largest value of one element; numerical types and pointers only. The
+    // undefined numerical type spans the widest signed integer's values.
     bool hasLimits() const;
     double minValue() const;
     double maxValue() const;

@@ -47,6 +47,8 @@ public:
     static bool isRepresentation(std::string_view representation);
 
     const std::vector<std::unique_ptr<KsCHostDataType>>& types() const { return types_; }
+    // The result type of comparisons and logical operations.
+    const KsCHostDataType* boolType() const { return bool_; }
 
     // KS_DataTypeServer. A non-empty dimension descriptor asks for the vector (one of rows and
     // columns positive) or the matrix (both positive) over the named type. Pointers, vectors and
@@ -71,7 +73,9 @@ public:
     KS_DataType* getInt16() override { return int16_; }
     KS_DataType* getInt32() override { return int32_; }
     KS_DataType* getInt64() override { return int64_; }
-    KS_DataType* getIntRepresentation() override { return int_; }
+    KS_DataType* getIntRepresentation(bool isSigned) override {
+        return isSigned ? int_ : unsignedInt_;
+    }
 
     // KS_PointerTypeServer
     KS_DataType* getScalarPointer(KS_DataType* target, KsCSrcRef* srcRef) override;

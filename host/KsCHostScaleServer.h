@@ -19,6 +19,9 @@ public:
 
     // The named scalings in the order of the interface, then the others in creation order.
     const std::vector<std::unique_ptr<KsCHostScaling>>& scalings() const { return scalings_; }
+    // The named scalings the listing compares operations with.
+    const KsCHostScaling* defaultScaling() const { return named_[0]; }
+    const KsCHostScaling* defaultBoolScaling() const { return named_[5]; }
     // Null for a width or a number of rows or columns below 1.
     KsCHostScaling* demand(KsCHostScaling::Kind kind, int rows, int columns, const double* lsbs,
                            const double* offsets, bool perElement);

@@ -43,10 +43,27 @@ bool KsCHostSymbolTable::removeMember(KsCSymbol* symbol) {
 
 KsCHostStatementTable::KsCHostStatementTable(Kind kind, KS_StatementTable* parent,
                                              KsCIcFileId* file)
-    : kind_(kind), parent_(parent), symbols_(this, file) {}
+    : kind_(kind), parent_(parent), symbols_(this, file),
+      head_(KsCHostStatement::Kind::Head, nullptr), tail_(&head_) {
+    head_.table_ = this;
+}
 
 KsCHostStatementTable::~KsCHostStatementTable() = default;
 
 KsCSymbolTable* KsCHostStatementTable::getSymbolTable() const {
     return const_cast<KsCHostSymbolTable*>(&symbols_);
+}
+
+void KsCHostStatementTable::insertBehind(KS_Statement* tail, KS_Statement* statement) {
+    KsCHostStatement* behind = KsCHostStatement::of(tail);
+    KsCHostStatement* added = KsCHostStatement::of(statement);
+    if (!behind || !added || behind->table_ != this || added->table_ ||
+        added->kind_ == KsCHostStatement::Kind::Head)
+        return;
+    added->table_ = this;
+    added->next_ = behind->next_;
+    behind->next_ = added;
+    if (tail_ == behind)
+        tail_ = added;
+    ++statementCount_;
 }

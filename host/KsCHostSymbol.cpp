@@ -95,8 +95,16 @@ const KsCHostSmbClass* KsCHostUnparamSymbol::smbClass() const {
     return dynamic_cast<const KsCHostSmbClass*>(varClass_);
 }
 
+std::string KsCHostUnparamSymbol::path() const {
+    std::string text = name_;
+    for (const KsCHostUnparamSymbol* s = owner_; s; s = s->owner_)
+        text = s->name_ + "." + text;
+    return text;
+}
+
 KsCHostUnparamSymbol*
 KsCHostUnparamSymbol::addComponent(std::unique_ptr<KsCHostUnparamSymbol> component) {
+    component->owner_ = this;
     components_.push_back(std::move(component));
     return components_.back().get();
 }

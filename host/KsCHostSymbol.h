@@ -160,6 +160,10 @@ public:
     KsCUnparamSymbol* getUnparamSymbol() override { return this; }
 
     const KsCHostSmbClass* smbClass() const override;
+    // The structured symbol this one is a component of; null for others.
+    const KsCHostUnparamSymbol* owner() const { return owner_; }
+    // The name with the names of the structured symbols around it: "pos.inner.z".
+    std::string path() const;
     // Appends a component; the symbol owns it.
     KsCHostUnparamSymbol* addComponent(std::unique_ptr<KsCHostUnparamSymbol> component);
     // One component per component of the symbol's structure type, recursively, each with the
@@ -168,6 +172,7 @@ public:
 
 private:
     KsCVarClassId* varClass_;
+    KsCHostUnparamSymbol* owner_ = nullptr;
     std::vector<std::unique_ptr<KsCHostUnparamSymbol>> components_;
 };
 

@@ -3,9 +3,11 @@
 #include "ItfAdditionalInfo/KsCItfAdditionalInfoEvaluator.h"
 #include "ItfControl/KsCItfHostServices.h"
 #include "ItfDataType/KsCItfDataTypeServer.h"
+#include "ItfExprLocation/KsCItfExprLocationDB.h"
 #include "ItfFactory/KsCItfFactory.h"
 #include "ItfFunctionServer/KsCItfFileServer.h"
 #include "ItfFunctionServer/KsCItfFunctionServer.h"
+#include "ItfICodeFactory/KsCItfICodeFactory.h"
 #include "ItfICodeGenerator/KsCItfICodeGenerator.h"
 #include "ItfIterationContext/KsCItfIterationContextServer.h"
 #include "ItfHostInterface/KS_Dump.h"
@@ -55,7 +57,9 @@ KsCItfControl::KsCItfControl() {
         fileServer_ = new KsCItfFileServer();
         functionServer_ = new KsCItfFunctionServer();
         symbolClassServer_ = new KsCItfSymbolClassServer();
+        iCodeFactory_ = new KsCItfICodeFactory();
         typeNameRegistry_ = new KsCItfTypeNameRegistry();
+        exprLocationDB_ = new KsCItfExprLocationDB();
         srcRefServer_ = new KsCItfSrcRefServer();
         iterationContextServer_ = new KsCItfIterationContextServer();
         additionalInfoEvaluator_ = new KsCItfAdditionalInfoEvaluator();
@@ -85,7 +89,9 @@ void KsCItfControl::releaseServers() {
     release(fileServer_);
     release(functionServer_);
     release(symbolClassServer_);
+    release(iCodeFactory_);
     release(typeNameRegistry_);
+    release(exprLocationDB_);
     release(srcRefServer_);
     release(iterationContextServer_);
     release(additionalInfoEvaluator_);
@@ -147,7 +153,21 @@ bool KsCItfControl::initServers(KS_ICodeFactoryContainer* container,
         !symbolClassServer_->init(host.varClassServer, fcnClassServer, classMutator,
                                   srcRefServer_, messages_))
         return false;
+    if (iCodeFactory_ &&
+        !iCodeFactory_->init(host.statementTableFactory, host.exprLocFactory,
+                             host.arithmeticOpFactory, host.opOperatorServer,
+                             host.statementFactory, container, host.numTypeServer,
+                             host.scaleServer, host.qsoBaseFactory, messages_, dataTypeServer_,
+                             host.baseTypeServer, host.stdCFcnCallFactory, host.qsoDerefFactory,
+                             host.qsoRefFactory, host.controlFlowOpFactory, host.baseOpFactory,
+                             host.bitOpFactory, exprLocationDB_, srcRefServer_,
+                             host.qsoVectorSliceBaseFactory, iterationContextServer_,
+                             host.loopOpFactory, additionalInfoEvaluator_, options_,
+                             variableServer_, host.rangeServer))
+        return false;
     if (typeNameRegistry_ && !typeNameRegistry_->init(host.dataTypeServer, messages_))
+        return false;
+    if (exprLocationDB_ && !exprLocationDB_->init())
         return false;
     if (srcRefServer_ && !srcRefServer_->init(host.srcRefServer))
         return false;
@@ -161,12 +181,11 @@ bool KsCItfControl::initServers(KS_ICodeFactoryContainer* container,
     return true;
 }
 
-// The operation factory and the expression location database join the orders at their places
-// when they are built.
 bool KsCItfControl::exit() {
     return finish(input_) && finish(factory_) && finish(iCodeGenerator_) && finish(messages_) &&
            finish(variableServer_) && finish(dataTypeServer_) && finish(fileServer_) &&
-           finish(functionServer_) && finish(symbolClassServer_) && finish(typeNameRegistry_) && finish(srcRefServer_) &&
+           finish(functionServer_) && finish(symbolClassServer_) && finish(iCodeFactory_) &&
+           finish(typeNameRegistry_) && finish(exprLocationDB_) && finish(srcRefServer_) &&
            finish(iterationContextServer_) && finish(additionalInfoEvaluator_);
 }
 

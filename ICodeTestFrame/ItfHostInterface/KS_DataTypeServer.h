@@ -23,6 +23,8 @@ public:
     // The type itself when it is an integer, floating or boolean type (typedefs of them
     // included); null for void, pointers, vectors, matrices and structures.
     virtual KS_DataType* getNumericalType() = 0;
+    // 1 for a vector, 2 for a matrix, 0 for every other type.
+    virtual int getDimensionCount() const = 0;
     // The smallest and largest value of a numerical type; 0 for other types.
     virtual double getLowerLimit() const = 0;
     virtual double getUpperLimit() const = 0;

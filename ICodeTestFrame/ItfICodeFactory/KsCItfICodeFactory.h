@@ -31,6 +31,8 @@ class KS_Options;
 class KS_RangeServer;
 class KS_ExprLocation;
 class KS_Operation;
+class KS_ParamAccess;
+class KS_Statement;
 class KS_DataType;
 class KsCCodeStmTable;
 class KsCParamSymbol;
@@ -48,6 +50,12 @@ class KsCItfAdditionalInfo_ArgInfo;
 class KsCItfAdditionalInfo_IdxInfo;
 class KsCItfAdditionalInfo_IcInfo;
 class KsCItfAdditionalInfo_LoopInfo;
+class KsCItfOperationInfo;
+class KS_OpOperator;
+class KS_Scaling;
+class KS_Range;
+class KS_StatementTable;
+class KsCSrcRef;
 
 class KsCItfICodeFactory : public KsCItfObject {
 public:
@@ -140,6 +148,8 @@ public:
                             KS_ExprLocation*& location);
     bool createIterationContextAccess(KsCUnparamSymbol* vector, KsCItfAdditionalInfo_IcInfo* info,
                                       const KsCItfSrcRef* position, KS_ExprLocation*& location);
+    // "Operation kind 'matrix with iteration context' is not supported" and false.
+    bool reportMatrixWithIterationContext(const KsCItfSrcRef* position);
 
     // --- Statements, behind the output tail of `table` -----------------------------------
     bool createCodeBlock(KsCCodeStmTable* table, const KsCItfSrcRef* position,
@@ -177,4 +187,78 @@ public:
     bool createVoidReturn(KsCCodeStmTable* table, const KsCItfSrcRef* position);
     bool createBreak(KsCCodeStmTable* table, const KsCItfSrcRef* position);
     bool createContinue(KsCCodeStmTable* table, const KsCItfSrcRef* position);
+
+private:
+    enum class LoopKind { While, DoWhile, For, Generic };
+    // What the defaults and checks decided for one operation, before it is created.
+    struct Result {
+        KS_DataType* type = nullptr;
+        KS_Scaling* scaling = nullptr;
+        KS_Range* range = nullptr;
+        int level = 0;
+        unsigned flags = 0;
+        bool typeGiven = false;
+        bool scalingGiven = false;
+    };
+
+    KsCSrcRef* hostSrcRef(const KsCItfSrcRef* position);
+    bool fail(const KsCItfSrcRef* position, const ZnCXString& text);
+    bool reportUnsupported(const KsCItfSrcRef* position, const char* kind);
+    // The unary and binary routine; `second` is null for a unary operator.
+    bool createOperation(KS_OpOperator* op, KS_ExprLocation* first, KS_ExprLocation* second,
+                         bool assignment, KsCItfAdditionalInfo_OpInfo* node,
+                         const KsCItfSrcRef* position, KS_ExprLocation*& location);
+    bool defaultDataType(int group, KS_ExprLocation* first, KS_ExprLocation* second,
+                         const KsCItfSrcRef* position, KS_DataType*& type);
+    bool defaultScaling(int group, KS_ExprLocation* first, KS_ExprLocation* second,
+                        KS_Scaling*& scaling);
+    bool usualType(KS_ExprLocation* first, KS_ExprLocation* second, const KsCItfSrcRef* position,
+                   KS_DataType*& type);
+    bool promotedType(KS_ExprLocation* operand, const KsCItfSrcRef* position, KS_DataType*& type);
+    bool valueRange(const KsCItfOperationInfo& info, KS_DataType* type,
+                    const KsCItfSrcRef* position, KS_Range*& range);
+    int defaultLevel() const;
+    // Wraps and records whether type and scaling were defaulted.
+    bool wrapOperation(KS_Operation* operation, const Result& result, const KsCItfSrcRef* position,
+                       KS_ExprLocation*& location);
+    bool insertCall(KsCParamSymbol* function, int count, KS_ExprLocation* const* arguments,
+                    KS_ParamAccess* const* accesses, KS_DataType* const* types,
+                    KS_Scaling* const* scalings, int level, const KsCItfSrcRef* position,
+                    KS_ExprLocation*& location);
+    bool parameterScaling(KsCUnparamSymbol* formal, const KsCItfSrcRef* position,
+                          KS_Scaling*& scaling);
+    bool isEnclosingLoopSymbol(KS_ExprLocation* location, KS_StatementTable* scope) const;
+    bool isStrictlyQualified(KS_ExprLocation* index, KS_StatementTable* scope);
+    bool createLoop(LoopKind kind, KsCCodeStmTable* table, KS_ExprLocation* const expressions[3],
+                    KsCItfAdditionalInfo_IcInfo* icInfo, KsCItfAdditionalInfo_LoopInfo* loopInfo,
+                    const KsCItfSrcRef* position, KsCCodeStmTable*& body);
+    bool insertBehindTail(KsCCodeStmTable* table, KS_Statement* statement, int site);
+
+    KsCStmTableFactory* stmTableFactory_ = nullptr;
+    KS_ExprLocFactory* exprLocFactory_ = nullptr;
+    KS_ArithmeticOpFactory* arithmeticOpFactory_ = nullptr;
+    KS_OpOperatorServer* opOperatorServer_ = nullptr;
+    KsCStatementFactory* statementFactory_ = nullptr;
+    KS_ICodeFactoryContainer* container_ = nullptr;
+    KS_NumericalTypeServer* numTypeServer_ = nullptr;
+    KS_ScaleServer* scaleServer_ = nullptr;
+    KS_QSOBaseFactory* qsoBaseFactory_ = nullptr;
+    KsCItfMessages* messages_ = nullptr;
+    KsCItfDataTypeServer* dataTypeServer_ = nullptr;
+    KS_BaseTypeServer* baseTypeServer_ = nullptr;
+    KS_StdCFunctionCallFactory* stdCFunctionCallFactory_ = nullptr;
+    KS_QSODerefFactory* qsoDerefFactory_ = nullptr;
+    KS_QSORefFactory* qsoRefFactory_ = nullptr;
+    KS_ControlFlowOpFactory* controlFlowOpFactory_ = nullptr;
+    KsCOpBaseFactory* baseOpFactory_ = nullptr;
+    KS_BitOpFactory* bitOpFactory_ = nullptr;
+    KsCItfExprLocationDB* exprLocationDB_ = nullptr;
+    KsCItfSrcRefServer* srcRefServer_ = nullptr;
+    KS_QSOVectorSliceBaseFactory* vectorSliceFactory_ = nullptr;
+    KsCItfIterationContextServer* iterationContextServer_ = nullptr;
+    KsCLoopOpFactory* loopOpFactory_ = nullptr;
+    KsCItfAdditionalInfoEvaluator* evaluator_ = nullptr;
+    KS_Options* options_ = nullptr;
+    KsCItfVariableServer* variableServer_ = nullptr;
+    KS_RangeServer* rangeServer_ = nullptr;
 };

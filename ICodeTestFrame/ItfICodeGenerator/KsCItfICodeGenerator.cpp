@@ -242,26 +242,5 @@ bool KsCItfICodeGenerator::translateBody(KsCItfCompoundStatement* body, KsCCodeS
         reportInternalError("KsCItfICodeGenerator", 150);
         return false;
     }
-    KsCItfDeclarationList* declarations = nullptr;
-    KsCItfStatementList* statements = nullptr;
-    if (auto* both = body->asCompoundStatement_DeclarationList_StatementList()) {
-        declarations = both->DeclarationList;
-        statements = both->StatementList;
-    } else if (auto* only = body->asCompoundStatement_DeclarationList()) {
-        declarations = only->DeclarationList;
-    } else if (auto* only = body->asCompoundStatement_StatementList()) {
-        statements = only->StatementList;
-    } else if (!body->asCompoundStatement_Empty()) {
-        reportInternalError("KsCItfICodeGenerator", 160);
-        return true;
-    }
-    const Scope scope{file, table, false};
-    if (declarations)
-        for (KsCItfDeclaration* declaration : declarations->Declaration)
-            if (!translateDeclaration(declaration, scope))
-                return false;
-    // Statements are not translated yet: a body holding one ends the walk at it.
-    if (statements && !statements->Statement.empty())
-        return unsupported(statements->Statement.front()->getSrcRef());
-    return true;
+    return translateCompound(body, table, file, false);
 }

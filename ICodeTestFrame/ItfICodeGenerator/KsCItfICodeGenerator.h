@@ -24,6 +24,7 @@ class KsCItfFunctionServer;
 class KsCItfICodeFactory;
 class KsCItfIterationContextServer;
 class KsCItfSrcRef;
+class KS_ExprLocation;
 
 class KsCItfICodeGenerator : public KsCItfObject {
 public:
@@ -49,6 +50,8 @@ public:
         KsCItfParameterTypeList* parameters = nullptr;
     };
     using Values = std::vector<double, KsCItfAllocator<double>>;
+    // A node of the expression levels that the chain walk knows.
+    struct ChainNode;
 
 private:
     // One translation unit's context: its host file and the statement table declarations go
@@ -69,6 +72,62 @@ private:
     bool declareParameter(KsCItfParameterDeclaration* parameter, KsCParamSymbol* function);
     bool translateIterationContextDefinition(KsCItfIterationContextDefinition* definition);
     bool translateBody(KsCItfCompoundStatement* body, KsCCodeStmTable* table, KsCIcFileId* file);
+
+    // Statements, into `table`; `file` is the unit's host file, for prototypes in blocks.
+    bool translateStatement(KsCItfStatement* statement, KsCCodeStmTable* table,
+                            KsCIcFileId* file);
+    // With `newBlock` a nested code block is made first and the statement goes into it.
+    bool translateCompound(KsCItfCompoundStatement* compound, KsCCodeStmTable* table,
+                           KsCIcFileId* file, bool newBlock);
+    // A branch or loop body: it must be a compound statement ("Unsupported language element"
+    // at the position of the statement that owns it); it goes into `table`.
+    bool translateBranch(KsCItfStatement* statement, KsCCodeStmTable* table, KsCIcFileId* file,
+                         const KsCItfSrcRef* owner);
+    bool translateExpressionStatement(KsCItfExpressionStatement* statement, KsCCodeStmTable* table);
+    bool translateSelection(KsCItfSelectionStatement* statement, KsCCodeStmTable* table,
+                            KsCIcFileId* file);
+    bool translateSwitch(KsCItfSelectionStatement_SWITCH* statement, KsCCodeStmTable* table,
+                         KsCIcFileId* file);
+    bool translateIteration(KsCItfIterationStatement* statement, KsCCodeStmTable* table,
+                            KsCIcFileId* file);
+    bool translateJump(KsCItfJumpStatement* statement, KsCCodeStmTable* table);
+
+    // Expressions: the location of the expression that stands in `scope`.
+    bool translateExpression(KsCItfExpression* expression, KsCCodeStmTable* scope,
+                             KS_ExprLocation*& location);
+    bool translateAssignment(KsCItfAssignmentExpression* expression, KsCCodeStmTable* scope,
+                             KS_ExprLocation*& location);
+    bool translateConditional(KsCItfConditionalExpression* expression, KsCCodeStmTable* scope,
+                              KS_ExprLocation*& location);
+    // The left-recursive binary levels, walked along their left operands without recursion,
+    // so that chains of any length translate.
+    bool translateChain(const ChainNode& start, KsCCodeStmTable* scope,
+                        KS_ExprLocation*& location);
+    bool translateLogicalOr(KsCItfLogicalOrExpression* expression, KsCCodeStmTable* scope,
+                            KS_ExprLocation*& location);
+    bool translateCast(KsCItfCastExpression* expression, KsCCodeStmTable* scope,
+                       KS_ExprLocation*& location);
+    bool translateUnary(KsCItfUnaryExpression* expression, KsCCodeStmTable* scope,
+                        KS_ExprLocation*& location);
+    bool translatePostfix(KsCItfPostfixExpression* expression, KsCCodeStmTable* scope,
+                          KS_ExprLocation*& location);
+    bool translatePrimary(KsCItfPrimaryExpression* expression, KsCCodeStmTable* scope,
+                          KS_ExprLocation*& location);
+    bool translateCall(KsCItfPostfixExpression* callee, KsCItfArgumentExpressionList* arguments,
+                       const KsCItfSrcRef* position, KsCCodeStmTable* scope,
+                       KS_ExprLocation*& location);
+    bool translateElementAccess(KsCItfPostfixExpression* access, KsCCodeStmTable* scope,
+                                KS_ExprLocation*& location);
+    bool translateIterationContextAccess(KsCItfPostfixExpression_Qualified* access,
+                                         KsCCodeStmTable* scope, KS_ExprLocation*& location);
+    bool translateComponentAccess(KsCItfPostfixExpression* selection, KsCCodeStmTable* scope,
+                                  KS_ExprLocation*& location);
+    // The variable a name path (a name, or a chain of component selections) reaches.
+    bool lookupPath(KsCItfPostfixExpression* path, KsCCodeStmTable* scope,
+                    const KsCItfSrcRef* position, class KsCUnparamSymbol*& symbol, bool& isPath);
+    // The text of a cast's or sizeof's type name; "Unsupported language element" for an
+    // abstract declarator or a qualifier, "Cannot assemble datatype identifier" otherwise.
+    bool typeNameText(KsCItfTypeName* typeName, ZnCXString& text);
 
     // Declarations, at file level and in blocks alike.
     bool translateDeclaration(KsCItfDeclaration* declaration, const Scope& scope);

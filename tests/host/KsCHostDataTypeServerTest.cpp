@@ -64,7 +64,8 @@ TEST_F(KsCHostDataTypeServerTest, VoidAndTheUndefinedTypeHaveNoWidthOrSign) {
         EXPECT_FALSE(type->isSignedInteger() || type->isUnsignedInteger() || type->isFloat());
     }
     EXPECT_EQ(types.getUndefinedNumerical()->getName(), "UNDEFINED_TYPE");
-    EXPECT_EQ(types.getIntRepresentation(), types.getInt());
+    EXPECT_EQ(types.getIntRepresentation(true), types.getInt());
+    EXPECT_EQ(types.getIntRepresentation(false), types.getUnsignedInt());
 }
 
 TEST_F(KsCHostDataTypeServerTest, NamesResolveToTheSameObjects) {
