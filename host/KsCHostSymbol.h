@@ -119,6 +119,7 @@ public:
 
     ZnCXString getName() const override { return ZnCXString(name_); }
     KS_DataType* getDataType() const override { return type_; }
+    KS_Scaling* getScaling() const override { return scaling_; }
     KsCSymbolTable* getSymbolTable() const override { return table_; }
     void setKind(SMB_SymbolKind kind) override { setKindValue(kind); }
     void markAsRootInterface() override { setMark(KS_HOST_MARK_ROOT_INTERFACE, true); }

@@ -44,6 +44,7 @@ public:
     virtual ~KsCSymbol();
     virtual ZnCXString getName() const = 0;
     virtual KS_DataType* getDataType() const = 0;
+    virtual KS_Scaling* getScaling() const = 0;
     // The table the symbol was entered into first; null before.
     virtual KsCSymbolTable* getSymbolTable() const = 0;
     virtual void setKind(SMB_SymbolKind kind) = 0;

@@ -630,13 +630,11 @@ bool KsCItfICodeFactory::createTernaryOperation(KS_ExprLocation* condition, KS_E
 
 // ---- Calls --------------------------------------------------------------------------------
 
-bool KsCItfICodeFactory::parameterScaling(KsCUnparamSymbol* formal, const KsCItfSrcRef* position,
+bool KsCItfICodeFactory::parameterScaling(KsCUnparamSymbol* formal, const KsCItfSrcRef*,
                                           KS_Scaling*& scaling) {
-    // A symbol tells its scaling only through an access to it.
-    KS_ExprLocation* access = exprLocFactory_->createSymbolAccess(formal, hostSrcRef(position));
-    if (!present(access, kSiteNoLocation))
+    if (!present(formal, kSiteNoSymbol))
         return false;
-    scaling = access->getScaling();
+    scaling = formal->getScaling();
     return true;
 }
 

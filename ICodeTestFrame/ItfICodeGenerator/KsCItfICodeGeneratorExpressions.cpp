@@ -653,9 +653,7 @@ bool KsCItfICodeGenerator::translateIterationContextAccess(
         return iCodeFactory_->createIterationContextAccess(symbol, access->AdditionalInfo_IcInfo,
                                                            position, location);
     case 2:
-        messages_->reportTraversalError(
-            position, "Operation kind 'matrix with iteration context' is not supported");
-        return false;
+        return iCodeFactory_->reportMatrixWithIterationContext(position);
     default:
         messages_->reportTraversalError(position,
                                         "Variable is used with wrong number of dimensions");
