@@ -106,8 +106,8 @@ BENCHMARK(BM_ScanParse)->Unit(benchmark::kMillisecond);
 
 void writeGenerationSuite(const std::filesystem::path& folder, int scale);
 
-// `itf-bench --write-suite DIR` writes the generated suite as test files, for timing whole
-// runs of itf-run over it; `--write-generation-suite DIR [SCALE]` the declaration suite (SCALE
+// `itf-bench --write-suite DIR [FILES]` writes the generated suite (or FILES files of it) as
+// test files, for timing whole runs of itf-run over it; `--write-generation-suite DIR [SCALE]` the declaration suite (SCALE
 // times the benchmark's, default 1) with its two host configurations (*.json, beside the test
 // files); without them the benchmarks run.
 int main(int argc, char** argv) {
@@ -115,12 +115,17 @@ int main(int argc, char** argv) {
         writeGenerationSuite(argv[2], argc == 4 ? std::max(1, std::atoi(argv[3])) : 1);
         return 0;
     }
-    if (argc == 3 && std::string_view(argv[1]) == "--write-suite") {
+    if ((argc == 3 || argc == 4) && std::string_view(argv[1]) == "--write-suite") {
         std::filesystem::create_directories(argv[2]);
-        for (const auto& file : suite())
+        const std::vector<ItfGeneratedFile> files =
+            argc == 4 ? generateSuite(std::max(1, std::atoi(argv[3])), 5000) : suite();
+        std::size_t bytes = 0;
+        for (const auto& file : files) {
             std::ofstream(std::filesystem::path(argv[2]) / file.name, std::ios::binary)
                 << file.text;
-        std::printf("%zu files, %zu bytes\n", suite().size(), suiteBytes());
+            bytes += file.text.size();
+        }
+        std::printf("%zu files, %zu bytes\n", files.size(), bytes);
         return 0;
     }
     benchmark::Initialize(&argc, argv);
